@@ -1,0 +1,8 @@
+// The host framework stand-in: everything the drafting settings module calls.
+#pragma once
+
+#include "ZEPHostTypes.h"
+#include "ZEPSystem.h"
+#include "ZEPDialog.h"
+#include "ZEPSettings.h"
+#include "ZEPDlgDriver.h"

@@ -1,0 +1,171 @@
+#include "ZEPSettings.h"
+
+#include <algorithm>
+#include <cmath>
+#include <type_traits>
+
+ZEP_IMPLEMENT_CLASS(ZEPDlgLock, ZEPDialog)
+
+// ---- padlock --------------------------------------------------------------------------------
+ZEPDlgLock::ZEPDlgLock(ZEPDialog* iParent, const ZEPString& iName, const ZEPSettingInfo& iInfo, unsigned long iStyle)
+    : ZEPDialog(iParent, iName, iStyle), _info(iInfo) {
+  SetIconName(_info.IsLocked() ? "I_Locked" : "I_Unlocked");
+}
+
+ZEPDlgLock::~ZEPDlgLock() {
+  for (ZEPDialog* d : _associated) d->_pGoverningLock = nullptr;
+}
+
+void ZEPDlgLock::AddAssociatedDialog(ZEPDialog* iDialog) {
+  if (!iDialog || iDialog == this) return;
+  if (iDialog->_pGoverningLock && iDialog->_pGoverningLock != this)
+    iDialog->_pGoverningLock->RemoveAssociatedDialog(iDialog);
+  if (std::find(_associated.begin(), _associated.end(), iDialog) == _associated.end()) _associated.push_back(iDialog);
+  iDialog->_pGoverningLock = this;
+  if (IsLocked()) iDialog->SetSensitivity(ZEPDlgDisable);
+}
+
+void ZEPDlgLock::RemoveAssociatedDialog(ZEPDialog* iDialog) {
+  _associated.erase(std::remove(_associated.begin(), _associated.end(), iDialog), _associated.end());
+  if (iDialog && iDialog->_pGoverningLock == this) iDialog->_pGoverningLock = nullptr;
+}
+
+long ZEPDlgLock::GetAssociatedDialogSensitivity(unsigned long& oSensitivity) const {
+  oSensitivity = IsLocked() ? ZEPDlgDisable : ZEPDlgEnable;
+  return S_OK;
+}
+
+void ZEPDlgLock::SetLocked(bool iLocked) {
+  _info.SetLocked(iLocked);
+  SetIconName(iLocked ? "I_Locked" : "I_Unlocked");
+  for (ZEPDialog* d : _associated) d->SetSensitivity(iLocked ? ZEPDlgDisable : ZEPDlgEnable);
+}
+
+void ZEPDlgLock::DumpState(std::string& ioOut) const {
+  if (!IsLocked()) {
+    ioOut += " open";
+    return;
+  }
+  ioOut += " LOCKED";
+  if (!_info.GetLockText().empty()) ioOut += " (" + _info.GetLockText() + ")";
+}
+
+// ---- repositories ---------------------------------------------------------------------------
+namespace {
+template <class R> std::map<std::string, std::unique_ptr<R>>& Registry() {
+  static std::map<std::string, std::unique_ptr<R>> registry;
+  return registry;
+}
+
+template <class T> std::vector<T> const* As(const ZEPSysSettingRepository::Value* v) {
+  return v ? std::get_if<std::vector<T>>(v) : nullptr;
+}
+} // namespace
+
+ZEPSysSettingRepository* ZEPSysSettingRepository::GetRepository(const char* iName, int) {
+  if (!iName) return nullptr;
+  auto& reg = Registry<ZEPSysSettingRepository>();
+  auto it = reg.find(iName);
+  return it == reg.end() ? nullptr : it->second.get();
+}
+
+ZEPSysSettingRepository* ZEPSysSettingRepository::Open(const std::string& iName) {
+  auto& slot = Registry<ZEPSysSettingRepository>()[iName];
+  if (!slot) slot = std::make_unique<ZEPSysSettingRepository>(iName);
+  return slot.get();
+}
+
+void ZEPSysSettingRepository::Close(const std::string& iName) { Registry<ZEPSysSettingRepository>().erase(iName); }
+void ZEPSysSettingRepository::CloseAll() { Registry<ZEPSysSettingRepository>().clear(); }
+
+const ZEPSysSettingRepository::Value* ZEPSysSettingRepository::Effective(const std::string& iName) const {
+  auto d = _defaults.find(iName);
+  if (IsLocked(iName)) return d == _defaults.end() ? nullptr : &d->second;
+  auto u = _user.find(iName);
+  if (u != _user.end()) return &u->second;
+  return d == _defaults.end() ? nullptr : &d->second;
+}
+
+template <class T> int ZEPSysSettingRepository::Read(const char* iName, T* oValues, int iCount) const {
+  if (!iName || !oValues || iCount <= 0) return 0;
+  const std::vector<T>* stored = As<T>(Effective(iName));
+  if (!stored) return 0;
+  int n = std::min(iCount, static_cast<int>(stored->size()));
+  std::copy(stored->begin(), stored->begin() + n, oValues);
+  return n;
+}
+
+template <class T> int ZEPSysSettingRepository::Write(const char* iName, const T* iValues, int iCount) {
+  if (!iName || !*iName || !iValues || iCount <= 0 || IsLocked(iName)) return 0;
+  if constexpr (std::is_floating_point_v<T>) {
+    for (int i = 0; i < iCount; ++i)
+      if (!std::isfinite(iValues[i])) return 0; // no NaN or infinity ever reaches a store
+  }
+  std::vector<T> values(iValues, iValues + iCount);
+  auto it = _user.find(iName);
+  if (it != _user.end()) {
+    const std::vector<T>* old = std::get_if<std::vector<T>>(&it->second);
+    if (old && *old == values) return 1;
+  }
+  _user[iName] = std::move(values);
+  _modified = true;
+  return 1;
+}
+
+int ZEPSysSettingRepository::ReadAttr(const char* n, double* v, int c) const { return Read(n, v, c); }
+int ZEPSysSettingRepository::ReadAttr(const char* n, int* v, int c) const { return Read(n, v, c); }
+int ZEPSysSettingRepository::ReadAttr(const char* n, unsigned int* v, int c) const { return Read(n, v, c); }
+int ZEPSysSettingRepository::WriteAttr(const char* n, const double* v, int c) { return Write(n, v, c); }
+int ZEPSysSettingRepository::WriteAttr(const char* n, const int* v, int c) { return Write(n, v, c); }
+int ZEPSysSettingRepository::WriteAttr(const char* n, const unsigned int* v, int c) { return Write(n, v, c); }
+
+long ZEPSysSettingRepository::SaveRepository(const char*) {
+  if (!_modified) return S_OK;
+  long rc = _saveHandler ? _saveHandler(*this) : S_OK;
+  if (SUCCEEDED(rc)) _modified = false;
+  return rc;
+}
+
+void ZEPSysSettingRepository::SetDefault(const std::string& iName, const Value& iValue) { _defaults[iName] = iValue; }
+
+void ZEPSysSettingRepository::SetLock(const std::string& iName, bool iLocked, const std::string& iText) {
+  if (iLocked) _locks[iName] = Lock{true, iText};
+  else _locks.erase(iName);
+}
+
+bool ZEPSysSettingRepository::IsLocked(const std::string& iName) const {
+  auto it = _locks.find(iName);
+  return it != _locks.end() && it->second.locked;
+}
+
+long ZEPSysSettingRepository::GetLockInfo(const std::string& iName, ZEPSettingInfo& oInfo) const {
+  auto it = _locks.find(iName);
+  bool locked = it != _locks.end() && it->second.locked;
+  oInfo.SetLocked(locked);
+  oInfo.SetLockText(locked ? it->second.text : std::string());
+  return S_OK;
+}
+
+int ZEPSysSettingRepository::ResetAttr(const std::string& iName) {
+  if (IsLocked(iName)) return 0;
+  if (_user.erase(iName)) _modified = true;
+  return 1;
+}
+
+void ZEPSysSettingRepository::SetUserValue(const std::string& iName, const Value& iValue) { _user[iName] = iValue; }
+
+ZEPSysPreferenceRepository* ZEPSysPreferenceRepository::GetPreferenceRepository(const char* iName) {
+  if (!iName) return nullptr;
+  auto& reg = Registry<ZEPSysPreferenceRepository>();
+  auto it = reg.find(iName);
+  return it == reg.end() ? nullptr : it->second.get();
+}
+
+ZEPSysPreferenceRepository* ZEPSysPreferenceRepository::Open(const std::string& iName) {
+  auto& slot = Registry<ZEPSysPreferenceRepository>()[iName];
+  if (!slot) slot = std::make_unique<ZEPSysPreferenceRepository>(iName);
+  return slot.get();
+}
+
+void ZEPSysPreferenceRepository::Close(const std::string& iName) { Registry<ZEPSysPreferenceRepository>().erase(iName); }
+void ZEPSysPreferenceRepository::CloseAll() { Registry<ZEPSysPreferenceRepository>().clear(); }

@@ -1,0 +1,197 @@
+#include "ZEPSystem.h"
+
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <fstream>
+#include <map>
+
+// ---- strings ------------------------------------------------------------------------------
+namespace {
+bool IsContinuation(unsigned char c) { return (c & 0xC0) == 0x80; }
+// Byte offsets at which each character starts.
+std::vector<size_t> CharStarts(const std::string& s) {
+  std::vector<size_t> starts;
+  for (size_t i = 0; i < s.size(); ++i)
+    if (!IsContinuation(static_cast<unsigned char>(s[i])) || starts.empty()) starts.push_back(i);
+  return starts;
+}
+} // namespace
+
+int ZEPUnicodeString::GetLengthInChar() const { return static_cast<int>(CharStarts(_sText).size()); }
+
+ZEPUnicodeString ZEPUnicodeString::SubString(int iStart, int iLength) const {
+  std::vector<size_t> starts = CharStarts(_sText);
+  int n = static_cast<int>(starts.size());
+  if (iStart < 0) iStart = 0;
+  if (iStart >= n || iLength <= 0) return ZEPUnicodeString();
+  int end = iStart + iLength > n ? n : iStart + iLength;
+  size_t b = starts[static_cast<size_t>(iStart)];
+  size_t e = end == n ? _sText.size() : starts[static_cast<size_t>(end)];
+  return ZEPUnicodeString(_sText.substr(b, e - b));
+}
+
+ZEPUnicodeString ZEPUnicodeString::ToLower() const {
+  std::string s = _sText;
+  for (char& c : s)
+    if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
+  return ZEPUnicodeString(s);
+}
+
+void ZEPUnicodeString::RemoveTail(int iCount) {
+  int n = GetLengthInChar();
+  *this = SubString(0, n - iCount);
+}
+
+// ---- object model ---------------------------------------------------------------------------
+ZEPMetaObject::ZEPMetaObject(const char* iName, const ZEPMetaObject* iBase, const char* iExtendedType,
+                             const char* iFramework)
+    : _pName(iName), _pBase(iBase), _pExtended(iExtendedType), _pFramework(iFramework) {}
+
+bool ZEPMetaObject::IsAKindOf(const ZEPMetaObject* iOther) const {
+  for (const ZEPMetaObject* m = this; m; m = m->_pBase)
+    if (m == iOther) return true;
+  return false;
+}
+
+bool ZEPMetaObject::IsAKindOf(const char* iName) const {
+  if (!iName) return false;
+  for (const ZEPMetaObject* m = this; m; m = m->_pBase)
+    if (std::strcmp(m->_pName, iName) == 0) return true;
+  return false;
+}
+
+const ZEPMetaObject* ZEPBaseUnknown::MetaObject() {
+  static const ZEPMetaObject meta("ZEPBaseUnknown", nullptr);
+  return &meta;
+}
+
+ZEPBaseUnknown* ZEPSysDynamicCast(const ZEPMetaObject* iMeta, ZEPBaseUnknown* iObject) {
+  if (!iMeta || !iObject) return nullptr;
+  return iObject->GetMetaObject()->IsAKindOf(iMeta) ? iObject : nullptr;
+}
+
+// ---- checks ---------------------------------------------------------------------------------
+namespace {
+std::vector<ZEPCheckEntry>& Log() {
+  static std::vector<ZEPCheckEntry> entries;
+  return entries;
+}
+} // namespace
+
+const std::vector<ZEPCheckEntry>& ZEPCheckLog::Entries() { return Log(); }
+int ZEPCheckLog::Count() { return static_cast<int>(Log().size()); }
+bool ZEPCheckLog::Contains(const std::string& iExpression) {
+  for (const ZEPCheckEntry& e : Log())
+    if (e.expression == iExpression) return true;
+  return false;
+}
+void ZEPCheckLog::Clear() { Log().clear(); }
+void ZEPCheckLog::Add(const char* iReporter, const char* iExpression, const char* iPath, int iLine) {
+  ZEPCheckEntry e{iReporter ? iReporter : "", iExpression ? iExpression : "", iPath ? iPath : "", iLine};
+  if (ZEPGetEnv("ZEP_CHECK_STDERR"))
+    std::fprintf(stderr, "%s: %s (%s:%d)\n", e.reporter.c_str(), e.expression.c_str(), e.path.c_str(), e.line);
+  Log().push_back(std::move(e));
+}
+
+void Check_Pointer_Failed__(const char* iExpression, const char* iPath, int iLine, const char*) {
+  ZEPCheckLog::Add("Check_Pointer_Failed__", iExpression, iPath, iLine);
+}
+void Check_TRUE_Failed__(const char* iExpression, const char* iPath, int iLine, const char*) {
+  ZEPCheckLog::Add("Check_TRUE_Failed__", iExpression, iPath, iLine);
+}
+void CheckFailure__(const char* iExpression, const char* iPath, int iLine, const char*) {
+  ZEPCheckLog::Add("CheckFailure__", iExpression, iPath, iLine);
+}
+void Check_Handler_Failed__(const char* iExpression, const char* iPath, int iLine, const char*) {
+  ZEPCheckLog::Add("Check_Handler_Failed__", iExpression, iPath, iLine);
+}
+
+// ---- environment and catalogs ------------------------------------------------------------------
+const char* ZEPGetEnv(const char* iName) { return iName ? std::getenv(iName) : nullptr; }
+
+namespace {
+using Catalog = std::map<std::string, std::string>;
+std::map<std::string, Catalog>& Catalogs() {
+  static std::map<std::string, Catalog> loaded;
+  return loaded;
+}
+
+// Parses lines of the form: Key = "text";  with \" \\ \n escapes.
+Catalog LoadCatalog(const std::string& iPath) {
+  Catalog cat;
+  std::ifstream in(iPath);
+  std::string line;
+  while (std::getline(in, line)) {
+    size_t p = line.find_first_not_of(" \t");
+    if (p == std::string::npos || line[p] == '#') continue;
+    size_t eq = line.find('=', p);
+    if (eq == std::string::npos) continue;
+    std::string key = line.substr(p, eq - p);
+    while (!key.empty() && (key.back() == ' ' || key.back() == '\t')) key.pop_back();
+    size_t q = line.find('"', eq);
+    if (q == std::string::npos || key.empty()) continue;
+    std::string text;
+    bool closed = false;
+    for (size_t i = q + 1; i < line.size(); ++i) {
+      char c = line[i];
+      if (c == '\\' && i + 1 < line.size()) {
+        char n = line[++i];
+        text += n == 'n' ? '\n' : n;
+      } else if (c == '"') {
+        closed = true;
+        break;
+      } else {
+        text += c;
+      }
+    }
+    if (closed) cat[key] = text;
+  }
+  return cat;
+}
+
+const Catalog& GetCatalog(const std::string& iName) {
+  auto it = Catalogs().find(iName);
+  if (it != Catalogs().end()) return it->second;
+  Catalog cat;
+  // Catalog names are identifiers; anything else would reach outside the folder.
+  bool safe = !iName.empty() && iName.find_first_of("/\\.") == std::string::npos;
+  if (safe) cat = LoadCatalog(ZEPMsgCatalog::ResourceDir() + "/catalogs/" + iName + ".msg");
+  return Catalogs().emplace(iName, std::move(cat)).first->second;
+}
+} // namespace
+
+std::string ZEPMsgCatalog::ResourceDir() {
+  if (const char* env = ZEPGetEnv("ZEP_RESOURCES")) return env;
+#ifdef ZEP_RESOURCE_DIR
+  return ZEP_RESOURCE_DIR;
+#else
+  return "resources";
+#endif
+}
+
+void ZEPMsgCatalog::Reset() { Catalogs().clear(); }
+
+bool ZEPMsgCatalog::Find(const ZEPString& iCatalog, const ZEPString& iKey, ZEPUnicodeString& oText) {
+  const Catalog& cat = GetCatalog(iCatalog);
+  auto it = cat.find(iKey);
+  if (it == cat.end()) return false;
+  oText = ZEPUnicodeString(it->second);
+  return true;
+}
+
+ZEPUnicodeString ZEPMsgCatalog::BuildMessage(const ZEPString& iCatalog, const ZEPString& iKey,
+                                             const ZEPUnicodeString* iParams, int iParamCount,
+                                             const ZEPUnicodeString& iDefault, void*) {
+  ZEPUnicodeString text;
+  if (!Find(iCatalog, iKey, text)) return iDefault;
+  if (!iParams || iParamCount <= 0) return text;
+  // Parameters replace /p1, /p2, ... in order.
+  std::string s = text.str();
+  for (int i = iParamCount; i >= 1; --i) {
+    std::string tag = "/p" + std::to_string(i);
+    for (size_t at = s.find(tag); at != std::string::npos; at = s.find(tag, at + iParams[i - 1].str().size()))
+      s.replace(at, tag.size(), iParams[i - 1].str());
+  }
+  return ZEPUnicodeString(s);
+}
