@@ -6,3 +6,6 @@
 #include "ZEPDialog.h"
 #include "ZEPSettings.h"
 #include "ZEPDlgDriver.h"
+#include "ZEPCkeUnits.h"
+#include "ZEPScalesServices.h"
+#include "ZEPStdServices.h"

@@ -37,6 +37,9 @@ protected:
     ZEPCheckLog::Clear();
     ZEPSysSettingRepository::CloseAll();
     ZEPSysPreferenceRepository::CloseAll();
+    ZEPCkeUnitsSetup::Reset();
+    ZEPScalesSetup::Reset();
+    ZEPStdSetup::Reset();
   }
   // A top-level window that owns what a test builds on it.
   ZEPDlgWindow _root{nullptr, "root", 0};
