@@ -6,8 +6,9 @@
 #include <vector>
 
 #define S_OK 0L
-#define E_FAIL static_cast<long>(0x80004005L)
-#define E_NOTIMPL static_cast<long>(0x80004001L)
+// 32-bit result codes: failures are negative whatever the width of long.
+#define E_FAIL static_cast<long>(static_cast<int>(0x80004005u))
+#define E_NOTIMPL static_cast<long>(static_cast<int>(0x80004001u))
 #define SUCCEEDED(hr) ((long)(hr) >= 0)
 #define FAILED(hr) ((long)(hr) < 0)
 
