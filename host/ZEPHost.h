@@ -9,3 +9,4 @@
 #include "ZEPCkeUnits.h"
 #include "ZEPScalesServices.h"
 #include "ZEPStdServices.h"
+#include "ZEPSketcherSettings.h"
