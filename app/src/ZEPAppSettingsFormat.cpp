@@ -1,0 +1,497 @@
+#include "ZEPAppSettingsFormat.h"
+
+#include <nlohmann/json.hpp>
+
+#include <algorithm>
+#include <climits>
+#include <cmath>
+#include <cstdint>
+#include <set>
+#include <utility>
+
+namespace zepapp {
+
+using json = nlohmann::json;
+
+namespace {
+
+constexpr std::size_t kNone = std::string::npos;
+// Our files are five levels deep; anything far deeper is not a settings file, and refusing it
+// early keeps the position pass below cheap.
+constexpr int kMaxDepth = 32;
+constexpr std::size_t kMaxFaults = 20;
+
+const char* const kTypeKeys[] = {"double", "int", "unsigned"};
+
+std::size_t BomLength(const std::string& t) { return t.compare(0, 3, "\xEF\xBB\xBF") == 0 ? 3 : 0; }
+
+bool IsJsonSpace(char c) { return c == ' ' || c == '\t' || c == '\n' || c == '\r'; }
+
+std::size_t SkipSpace(const std::string& t, std::size_t i) {
+  while (i < t.size() && IsJsonSpace(t[i])) ++i;
+  return i;
+}
+
+// Offset of the first byte that does not belong to well-formed UTF-8 (no overlong forms,
+// surrogates or code points above U+10FFFF), or kNone.
+std::size_t FirstBadUtf8(const std::string& t) {
+  const auto* s = reinterpret_cast<const unsigned char*>(t.data());
+  const std::size_t n = t.size();
+  std::size_t i = 0;
+  while (i < n) {
+    unsigned char c = s[i];
+    if (c < 0x80) {
+      ++i;
+      continue;
+    }
+    int len = 0;
+    unsigned char lo = 0x80, hi = 0xBF; // allowed range of the second byte
+    if (c >= 0xC2 && c <= 0xDF) len = 2;
+    else if (c >= 0xE0 && c <= 0xEF) {
+      len = 3;
+      if (c == 0xE0) lo = 0xA0;
+      if (c == 0xED) hi = 0x9F;
+    } else if (c >= 0xF0 && c <= 0xF4) {
+      len = 4;
+      if (c == 0xF0) lo = 0x90;
+      if (c == 0xF4) hi = 0x8F;
+    } else return i;
+    if (i + 1 >= n || s[i + 1] < lo || s[i + 1] > hi) return i;
+    for (int k = 2; k < len; ++k)
+      if (i + k >= n || (s[i + k] & 0xC0) != 0x80) return i;
+    i += len;
+  }
+  return kNone;
+}
+
+// Offset where nesting first goes deeper than kMaxDepth, or kNone. Strings are skipped.
+std::size_t TooDeep(const std::string& t) {
+  int depth = 0;
+  for (std::size_t i = 0; i < t.size(); ++i) {
+    char c = t[i];
+    if (c == '"') {
+      for (++i; i < t.size() && t[i] != '"'; ++i)
+        if (t[i] == '\\') ++i;
+    } else if (c == '[' || c == '{') {
+      if (++depth > kMaxDepth) return i;
+    } else if (c == ']' || c == '}') --depth;
+  }
+  return kNone;
+}
+
+// Builds the document like nlohmann's own parser but keeps the place of a syntax error,
+// including the number overflows its throwing interface reports without one.
+class PlacedParser {
+public:
+  explicit PlacedParser(json& oRoot) : _dom(oRoot, false) {}
+  bool null() { return _dom.null(); }
+  bool boolean(bool v) { return _dom.boolean(v); }
+  bool number_integer(json::number_integer_t v) { return _dom.number_integer(v); }
+  bool number_unsigned(json::number_unsigned_t v) { return _dom.number_unsigned(v); }
+  bool number_float(json::number_float_t v, const std::string& s) { return _dom.number_float(v, s); }
+  bool string(std::string& v) { return _dom.string(v); }
+  bool binary(json::binary_t& v) { return _dom.binary(v); }
+  bool start_object(std::size_t n) { return _dom.start_object(n); }
+  bool key(std::string& v) { return _dom.key(v); }
+  bool end_object() { return _dom.end_object(); }
+  bool start_array(std::size_t n) { return _dom.start_array(n); }
+  bool end_array() { return _dom.end_array(); }
+  bool parse_error(std::size_t iPos, const std::string& iToken, const nlohmann::detail::exception& iEx) {
+    // iPos counts the characters read, the failing one included.
+    if (iEx.id == 406) { // number overflow: iPos is just past the number and one character more
+      _offset = iPos > iToken.size() ? iPos - iToken.size() : 0;
+      _message = "the number " + iToken + " is too large";
+    } else {
+      _offset = iPos > 0 ? iPos - 1 : 0;
+      _message = iEx.what();
+      // "[json.exception.parse_error.101] parse error at line 1, column 8: syntax error ..."
+      std::size_t at = _message.find("parse error");
+      std::size_t colon = at == kNone ? kNone : _message.find(": ", at);
+      if (colon != kNone) _message = _message.substr(colon + 2);
+    }
+    return false;
+  }
+  std::size_t Offset() const { return _offset; }
+  const std::string& Message() const { return _message; }
+
+private:
+  nlohmann::detail::json_sax_dom_parser<json> _dom;
+  std::size_t _offset = 0;
+  std::string _message;
+};
+
+std::string EscapePointer(const std::string& iKey) {
+  std::string out;
+  for (char c : iKey) {
+    if (c == '~') out += "~0";
+    else if (c == '/') out += "~1";
+    else out += c;
+  }
+  return out;
+}
+
+std::size_t SkipString(const std::string& t, std::size_t i) {
+  for (++i; i < t.size(); ++i) {
+    if (t[i] == '\\') ++i;
+    else if (t[i] == '"') return i + 1;
+  }
+  return t.size();
+}
+
+std::size_t SkipScalar(const std::string& t, std::size_t i) {
+  while (i < t.size() && !IsJsonSpace(t[i]) && t[i] != ',' && t[i] != ']' && t[i] != '}') ++i;
+  return i;
+}
+
+// Byte offsets of the values and keys of a well-formed document, by JSON pointer. nlohmann's
+// tree has no positions, so a second light pass over the text finds them. A repeated key is
+// remembered: the tree silently keeps only its last value.
+struct Positions {
+  std::map<std::string, std::size_t> values, keys;
+  std::string duplicate;
+  std::size_t duplicateAt = kNone;
+};
+
+Positions Locate(const std::string& t) {
+  struct Frame {
+    bool object;
+    std::string pointer;
+    std::size_t count;
+    std::set<std::string> keys;
+  };
+  Positions p;
+  std::vector<Frame> stack;
+  std::string pointer;
+  std::size_t i = SkipSpace(t, BomLength(t));
+  while (i < t.size()) {
+    p.values[pointer] = i;
+    bool complete = true;
+    if (t[i] == '{' || t[i] == '[') {
+      const char close = t[i] == '{' ? '}' : ']';
+      stack.push_back(Frame{t[i] == '{', pointer, 0, {}});
+      i = SkipSpace(t, i + 1);
+      if (i < t.size() && t[i] == close) {
+        stack.pop_back();
+        ++i;
+      } else complete = false;
+    } else i = t[i] == '"' ? SkipString(t, i) : SkipScalar(t, i);
+    // After a complete value a comma starts the next member, a bracket closes its container.
+    while (complete) {
+      if (stack.empty()) return p;
+      i = SkipSpace(t, i);
+      if (i >= t.size()) return p;
+      if (t[i] == ',') {
+        i = SkipSpace(t, i + 1);
+        ++stack.back().count;
+        complete = false;
+      } else {
+        ++i;
+        stack.pop_back();
+      }
+    }
+    Frame& f = stack.back();
+    if (!f.object) {
+      pointer = f.pointer + "/" + std::to_string(f.count);
+      continue;
+    }
+    const std::size_t keyAt = i;
+    const std::size_t end = SkipString(t, i);
+    json key = json::parse(t.begin() + static_cast<std::ptrdiff_t>(keyAt), t.begin() + static_cast<std::ptrdiff_t>(end),
+                           nullptr, false);
+    const std::string name = key.is_string() ? key.get<std::string>() : t.substr(keyAt, end - keyAt);
+    pointer = f.pointer + "/" + EscapePointer(name);
+    if (!f.keys.insert(name).second && p.duplicateAt == kNone) {
+      p.duplicate = name;
+      p.duplicateAt = keyAt;
+    }
+    p.keys[pointer] = keyAt;
+    i = SkipSpace(t, end);
+    if (i < t.size() && t[i] == ':') ++i;
+    i = SkipSpace(t, i);
+  }
+  return p;
+}
+
+std::string Describe(const json& j) {
+  switch (j.type()) {
+  case json::value_t::string: return "a string";
+  case json::value_t::array: return "an array";
+  case json::value_t::object: return "an object";
+  case json::value_t::null: return "null";
+  default: return j.dump();
+  }
+}
+
+// Checks a parsed document against the format, noting each fault at its place.
+class Checker {
+public:
+  Checker(const Positions& iPos, bool iAdmin) : _pos(iPos), _admin(iAdmin) {}
+
+  void Document(const json& iRoot, ZEPAppSettingsDoc& oDoc) {
+    if (_pos.duplicateAt != kNone)
+      Fault(_pos.duplicateAt, "the key \"" + _pos.duplicate + "\" appears twice; one of its values would be lost");
+    if (!iRoot.is_object()) {
+      Fault(ValueAt(""), "expected an object with \"format\", \"settings\" and \"preferences\", found " +
+                             Describe(iRoot));
+      return;
+    }
+    for (const auto& [key, value] : iRoot.items()) {
+      const std::string ptr = "/" + EscapePointer(key);
+      if (key == "format") {
+        if (!value.is_number_integer() || value.get<long long>() != kSettingsFormat)
+          Fault(ValueAt(ptr), "unsupported format " + value.dump() + "; this program reads format " +
+                                  std::to_string(kSettingsFormat));
+      } else if (key == "settings") {
+        Section(value, ptr, oDoc.settings);
+      } else if (key == "preferences") {
+        Section(value, ptr, oDoc.preferences);
+      } else {
+        Fault(KeyAt(ptr), "unknown key \"" + key + "\"; expected \"format\", \"settings\" or \"preferences\"");
+      }
+    }
+  }
+
+  std::vector<std::pair<std::size_t, std::string>>& Faults() { return _faults; }
+
+private:
+  std::size_t ValueAt(const std::string& iPtr) const {
+    auto it = _pos.values.find(iPtr);
+    return it == _pos.values.end() ? 0 : it->second;
+  }
+  std::size_t KeyAt(const std::string& iPtr) const {
+    auto it = _pos.keys.find(iPtr);
+    return it == _pos.keys.end() ? ValueAt(iPtr) : it->second;
+  }
+  void Fault(std::size_t iOffset, std::string iMessage) { _faults.emplace_back(iOffset, std::move(iMessage)); }
+
+  void Section(const json& iSection, const std::string& iPtr, std::map<std::string, ZEPAppRepoEntries>& oRepos) {
+    const std::string section = iPtr.substr(1);
+    if (!iSection.is_object()) {
+      Fault(ValueAt(iPtr), "\"" + section + "\" must be an object of repositories by name, found " +
+                               Describe(iSection));
+      return;
+    }
+    for (const auto& [repo, attrs] : iSection.items()) {
+      const std::string repoPtr = iPtr + "/" + EscapePointer(repo);
+      if (repo.empty()) {
+        Fault(KeyAt(repoPtr), "a repository needs a name");
+        continue;
+      }
+      if (!attrs.is_object()) {
+        Fault(ValueAt(repoPtr), section + "/" + repo + ": expected an object of attributes, found " + Describe(attrs));
+        continue;
+      }
+      ZEPAppRepoEntries& entries = oRepos[repo];
+      for (const auto& [attr, entry] : attrs.items()) {
+        const std::string attrPtr = repoPtr + "/" + EscapePointer(attr);
+        const std::string where = section + "/" + repo + "/" + attr + ": ";
+        if (attr.empty()) Fault(KeyAt(attrPtr), section + "/" + repo + ": an attribute needs a name");
+        else Entry(entry, attrPtr, where, entries[attr]);
+      }
+    }
+  }
+
+  void Entry(const json& iEntry, const std::string& iPtr, const std::string& iWhere, ZEPAppAttrEntry& oEntry) {
+    if (!iEntry.is_object()) {
+      Fault(ValueAt(iPtr), iWhere + "expected an object such as {\"int\": 1}, found " + Describe(iEntry));
+      return;
+    }
+    const std::size_t before = _faults.size();
+    for (const auto& [key, value] : iEntry.items()) {
+      const std::string ptr = iPtr + "/" + EscapePointer(key);
+      const bool isType = std::find(std::begin(kTypeKeys), std::end(kTypeKeys), key) != std::end(kTypeKeys);
+      if (isType) {
+        if (oEntry.value) Fault(KeyAt(ptr), iWhere + "holds more than one of \"double\", \"int\" and \"unsigned\"");
+        else Values(key, value, ptr, iWhere, oEntry);
+      } else if ((key == "locked" || key == "by") && !_admin) {
+        Fault(KeyAt(ptr), iWhere + "\"" + key + "\" belongs in the administrator's file");
+      } else if (key == "locked") {
+        if (value.is_boolean()) oEntry.locked = value.get<bool>();
+        else Fault(ValueAt(ptr), iWhere + "\"locked\" must be true or false, found " + Describe(value));
+      } else if (key == "by") {
+        if (value.is_string()) oEntry.by = value.get<std::string>();
+        else Fault(ValueAt(ptr), iWhere + "\"by\" must be a string, found " + Describe(value));
+      } else {
+        Fault(KeyAt(ptr), iWhere + "unknown key \"" + key + "\"; expected \"double\", \"int\" or \"unsigned\"" +
+                              (_admin ? ", \"locked\" or \"by\"" : ""));
+      }
+    }
+    if (_faults.size() == before && !oEntry.value && !oEntry.locked)
+      Fault(ValueAt(iPtr), iWhere + "no value: expected \"double\", \"int\" or \"unsigned\"");
+  }
+
+  void Values(const std::string& iType, const json& iValues, const std::string& iPtr, const std::string& iWhere,
+              ZEPAppAttrEntry& oEntry) {
+    const bool scalar = !iValues.is_array();
+    const std::size_t n = scalar ? 1 : iValues.size();
+    std::vector<double> d;
+    std::vector<int> s;
+    std::vector<unsigned int> u;
+    bool ok = true;
+    for (std::size_t k = 0; k < n; ++k) {
+      const json& v = scalar ? iValues : iValues[k];
+      const std::string ptr = scalar ? iPtr : iPtr + "/" + std::to_string(k);
+      const std::string where = iWhere + iType + (scalar ? "" : "[" + std::to_string(k) + "]") + ": ";
+      if (iType == "double") {
+        if (v.is_number() && std::isfinite(v.get<double>())) d.push_back(v.get<double>());
+        else {
+          Fault(ValueAt(ptr), where + "expected a finite number, found " + Describe(v));
+          ok = false;
+        }
+      } else if (iType == "int") {
+        bool fits = v.is_number_unsigned() ? v.get<std::uint64_t>() <= INT_MAX
+                    : v.is_number_integer()
+                        ? v.get<std::int64_t>() >= INT_MIN && v.get<std::int64_t>() <= INT_MAX
+                        : false;
+        if (fits) s.push_back(v.get<int>());
+        else {
+          Fault(ValueAt(ptr), where + "expected an integer from " + std::to_string(INT_MIN) + " to " +
+                                  std::to_string(INT_MAX) + ", found " + Describe(v));
+          ok = false;
+        }
+      } else {
+        bool fits = v.is_number_unsigned() ? v.get<std::uint64_t>() <= UINT_MAX
+                    : v.is_number_integer() ? v.get<std::int64_t>() >= 0 && v.get<std::int64_t>() <= UINT_MAX
+                                            : false;
+        if (fits) u.push_back(v.get<unsigned int>());
+        else {
+          Fault(ValueAt(ptr), where + "expected an unsigned integer from 0 to " + std::to_string(UINT_MAX) +
+                                  ", found " + Describe(v));
+          ok = false;
+        }
+      }
+    }
+    if (!ok) return;
+    if (iType == "double") oEntry.value = std::move(d);
+    else if (iType == "int") oEntry.value = std::move(s);
+    else oEntry.value = std::move(u);
+  }
+
+  const Positions& _pos;
+  bool _admin;
+  std::vector<std::pair<std::size_t, std::string>> _faults;
+};
+
+} // namespace
+
+std::string ZEPAppFileError::Text() const {
+  std::string out = path;
+  if (line > 0) out += ":" + std::to_string(line) + ":" + std::to_string(column);
+  return out + ": " + message;
+}
+
+void LineAndColumn(const std::string& iText, std::size_t iOffset, int& oLine, int& oColumn) {
+  oLine = 1;
+  oColumn = 1;
+  const std::size_t end = std::min(iOffset, iText.size());
+  for (std::size_t i = 0; i < end; ++i) {
+    const unsigned char c = static_cast<unsigned char>(iText[i]);
+    if (c == '\n') {
+      ++oLine;
+      oColumn = 1;
+    } else if ((c & 0xC0) != 0x80) {
+      ++oColumn;
+    }
+  }
+}
+
+bool IsFinite(const ZEPAppValue& iValue, std::size_t* oIndex) {
+  const auto* d = std::get_if<std::vector<double>>(&iValue);
+  if (!d) return true;
+  for (std::size_t k = 0; k < d->size(); ++k)
+    if (!std::isfinite((*d)[k])) {
+      if (oIndex) *oIndex = k;
+      return false;
+    }
+  return true;
+}
+
+std::vector<ZEPAppFileError> ParseSettingsText(const std::string& iText, const std::string& iPath, bool iAdmin,
+                                               ZEPAppSettingsDoc& oDoc) {
+  oDoc = ZEPAppSettingsDoc();
+  std::vector<std::pair<std::size_t, std::string>> faults;
+  const std::size_t start = SkipSpace(iText, BomLength(iText));
+  if (start == iText.size()) return {}; // a blank file is an empty one
+
+  const std::size_t bad = FirstBadUtf8(iText);
+  if (bad != kNone) {
+    char byte[8];
+    std::snprintf(byte, sizeof byte, "0x%02X", static_cast<unsigned char>(iText[bad]));
+    faults.emplace_back(bad, std::string("invalid UTF-8 (byte ") + byte + "); the file must be saved as UTF-8");
+  } else if (std::size_t deep = TooDeep(iText); deep != kNone) {
+    faults.emplace_back(deep, "nested more than " + std::to_string(kMaxDepth) + " levels deep");
+  } else {
+    json root;
+    PlacedParser parser(root);
+    if (!json::sax_parse(iText, &parser, json::input_format_t::json, true)) {
+      faults.emplace_back(parser.Offset(), parser.Message());
+    } else {
+      ZEPAppSettingsDoc doc;
+      Checker checker(Locate(iText), iAdmin);
+      checker.Document(root, doc);
+      faults = std::move(checker.Faults());
+      if (faults.empty()) oDoc = std::move(doc);
+    }
+  }
+
+  std::stable_sort(faults.begin(), faults.end(),
+                   [](const auto& a, const auto& b) { return a.first < b.first; });
+  if (faults.size() > kMaxFaults) faults.resize(kMaxFaults);
+  std::vector<ZEPAppFileError> errors;
+  for (auto& [offset, message] : faults) {
+    ZEPAppFileError e;
+    e.path = iPath;
+    LineAndColumn(iText, offset, e.line, e.column);
+    e.message = std::move(message);
+    errors.push_back(std::move(e));
+  }
+  return errors;
+}
+
+bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError) {
+  using ojson = nlohmann::ordered_json;
+  ojson root = ojson::object();
+  root["format"] = kSettingsFormat;
+  for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference}) {
+    const char* section = kind == ZEPAppRepoKind::Setting ? "settings" : "preferences";
+    ojson& out = root[section] = ojson::object();
+    for (const auto& [repo, entries] : iDoc.Of(kind)) {
+      ojson attrs = ojson::object();
+      for (const auto& [attr, entry] : entries) {
+        const std::string where = std::string(section) + "/" + repo + "/" + attr;
+        if (FirstBadUtf8(repo) != kNone || FirstBadUtf8(attr) != kNone || FirstBadUtf8(entry.by) != kNone) {
+          oError = where + " cannot be saved: its name is not valid UTF-8";
+          return false;
+        }
+        ojson e = ojson::object();
+        if (entry.value) {
+          std::size_t bad = 0;
+          if (!IsFinite(*entry.value, &bad)) {
+            oError = where + " cannot be saved: value " + std::to_string(bad + 1) + " is not a finite number";
+            return false;
+          }
+          std::visit(
+              [&](const auto& values) {
+                using T = typename std::decay_t<decltype(values)>::value_type;
+                const char* type = std::is_same_v<T, double> ? "double" : std::is_same_v<T, int> ? "int" : "unsigned";
+                e[type] = values.size() == 1 ? ojson(values.front()) : ojson(values);
+              },
+              *entry.value);
+        }
+        if (iAdmin && entry.locked) e["locked"] = true;
+        if (iAdmin && !entry.by.empty()) e["by"] = entry.by;
+        if (!e.empty()) attrs[attr] = std::move(e);
+      }
+      if (!attrs.empty()) out[repo] = std::move(attrs);
+    }
+  }
+  try {
+    oText = root.dump(2) + "\n";
+  } catch (const std::exception& ex) {
+    oError = std::string("cannot write the settings: ") + ex.what();
+    return false;
+  }
+  return true;
+}
+
+} // namespace zepapp

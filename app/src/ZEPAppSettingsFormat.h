@@ -1,0 +1,88 @@
+// The JSON form of the settings files, read with the position of every fault.
+//
+//   {
+//     "format": 1,
+//     "settings": {
+//       "DraftingOptions": {
+//         "DrwPaperLengthUnit": {"int": 1},
+//         "Drw_GridSpacing": {"double": [10.0, 20.0, 30.0, 40.0, 50.0]},
+//         "Drw_GridColor": {"unsigned": [255, 0, 0], "locked": true, "by": "cad-admin"}
+//       }
+//     },
+//     "preferences": {
+//       "DraftingOptions": {"dlgPropTbBehaviorX": {"int": 120}}
+//     }
+//   }
+//
+// Each attribute holds exactly one of "double", "int" or "unsigned": an array, or a scalar for
+// a single value. Only the administrator's file may add "locked" (a default is not a lock) and
+// "by", who locked it. "format" may be left out; anything else unknown is a fault rather than
+// something silently dropped at the next save.
+#pragma once
+
+#include "ZEPSettings.h"
+
+#include <map>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace zepapp {
+
+using ZEPAppValue = ZEPSysSettingRepository::Value;
+
+enum class ZEPAppRepoKind { Setting, Preference };
+
+struct ZEPAppAttrEntry {
+  std::optional<ZEPAppValue> value;
+  bool locked = false;
+  std::string by; // who locked it
+  bool operator==(const ZEPAppAttrEntry& o) const {
+    return value == o.value && locked == o.locked && by == o.by;
+  }
+};
+
+// Attribute name -> entry.
+using ZEPAppRepoEntries = std::map<std::string, ZEPAppAttrEntry>;
+
+// The content of one settings file: repositories by name.
+struct ZEPAppSettingsDoc {
+  std::map<std::string, ZEPAppRepoEntries> settings;
+  std::map<std::string, ZEPAppRepoEntries> preferences;
+  std::map<std::string, ZEPAppRepoEntries>& Of(ZEPAppRepoKind iKind) {
+    return iKind == ZEPAppRepoKind::Setting ? settings : preferences;
+  }
+  const std::map<std::string, ZEPAppRepoEntries>& Of(ZEPAppRepoKind iKind) const {
+    return iKind == ZEPAppRepoKind::Setting ? settings : preferences;
+  }
+};
+
+// A fault of a settings file. line and column are 1-based (columns count characters); 0 when
+// the fault has no place in the text (an unreadable file).
+struct ZEPAppFileError {
+  std::string path;
+  int line = 0;
+  int column = 0;
+  std::string message;
+  // "path:line:column: message", the form editors jump to.
+  std::string Text() const;
+};
+
+inline constexpr int kSettingsFormat = 1;
+
+// Reads iText, the content of iPath. Blank text is an empty file. Answers the faults in text
+// order (empty when oDoc is filled); at most a few dozen are kept.
+std::vector<ZEPAppFileError> ParseSettingsText(const std::string& iText, const std::string& iPath,
+                                               bool iAdmin, ZEPAppSettingsDoc& oDoc);
+
+// Writes iDoc in the form above. False with oError when something cannot be written faithfully
+// (a NaN or infinity, a name that is not UTF-8); iAdmin keeps locks, else they are left out.
+bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError);
+
+// Line and column (1-based, characters) of a byte offset of iText.
+void LineAndColumn(const std::string& iText, std::size_t iOffset, int& oLine, int& oColumn);
+
+// Whether every double of iValue is finite; oIndex tells the first that is not.
+bool IsFinite(const ZEPAppValue& iValue, std::size_t* oIndex = nullptr);
+
+} // namespace zepapp
