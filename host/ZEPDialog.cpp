@@ -74,7 +74,7 @@ ZEPNotification* ZEPCommand::OwnNotification(const char* iKind) {
   return _notifications.back().get();
 }
 
-void ZEPCommand::RunCallbacks(ZEPNotification* iNotif) {
+void ZEPCommand::RunCallbacks(ZEPNotification* iNotif, ZEPCommand* iSender) {
   // A callback may register or remove callbacks: run on a copy, and skip the
   // subscribers that have gone in between.
   std::uint64_t serial = _serial;
@@ -82,7 +82,7 @@ void ZEPCommand::RunCallbacks(ZEPNotification* iNotif) {
   for (const Subscription& s : subs) {
     if (s.notif != iNotif) continue;
     if (!IsAlive(this, serial) || !IsAlive(s.subscriber, s.subscriberSerial)) continue;
-    s.callback(this, iNotif, s.data);
+    s.callback(iSender, iNotif, s.data);
   }
 }
 
@@ -92,7 +92,11 @@ void ZEPCommand::SendNotification(ZEPNotification* iNotif) {
   std::vector<std::pair<ZEPCommand*, std::uint64_t>> chain;
   for (ZEPCommand* c = this; c; c = c->GetFather()) chain.push_back({c, c->_serial});
   for (auto& link : chain)
-    if (IsAlive(link.first, link.second)) link.first->RunCallbacks(iNotif);
+    if (IsAlive(link.first, link.second)) link.first->RunCallbacks(iNotif, link.first);
+}
+
+void ZEPCommand::DeliverAs(ZEPNotification* iNotif, ZEPCommand* iApparentSender) {
+  if (iNotif) RunCallbacks(iNotif, iApparentSender);
 }
 
 // ---- widgets --------------------------------------------------------------------------------

@@ -56,6 +56,10 @@ public:
   // then those on each father in turn, each with the command it was registered on as sender.
   void SendNotification(ZEPNotification* iNotif);
 
+  // Runs the callbacks registered on this command for iNotif as if iApparentSender had sent
+  // it: how tests and tools check that a callback ignores what is not its own control.
+  void DeliverAs(ZEPNotification* iNotif, ZEPCommand* iApparentSender);
+
   // A notification object owned by this command, created on first use.
   ZEPNotification* OwnNotification(const char* iKind);
 
@@ -83,7 +87,7 @@ private:
     ZEPCommand* sender;
     std::uint64_t serial;
   };
-  void RunCallbacks(ZEPNotification* iNotif);
+  void RunCallbacks(ZEPNotification* iNotif, ZEPCommand* iSender);
 
   std::uint64_t _serial;
   std::vector<Subscription> _subscriptions; // callbacks registered on this command

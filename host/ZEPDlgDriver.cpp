@@ -154,6 +154,14 @@ bool DisabledBySensitivity(const ZEPDialog* w) {
   return false;
 }
 
+// A frame around a control shows its title through that control: print it once.
+bool TitleShownByChild(const ZEPDialog* w) {
+  if (std::string(w->KindName()) != "frame") return false;
+  for (const ZEPDialog* child : w->GetChildren())
+    if (child->GetTitle() == w->GetTitle()) return true;
+  return false;
+}
+
 void DumpWidget(const ZEPDialog* w, int depth, std::string& out) {
   out.append(static_cast<size_t>(depth) * 2, ' ');
   out += w->KindName();
@@ -163,7 +171,7 @@ void DumpWidget(const ZEPDialog* w, int depth, std::string& out) {
     out += " @" + std::to_string(c.row) + "," + std::to_string(c.column);
     if (c.width != 1 || c.height != 1) out += " span " + std::to_string(c.width) + "x" + std::to_string(c.height);
   }
-  if (!w->GetTitle().IsEmpty()) out += " title=" + QuoteText(w->GetTitle().str());
+  if (!w->GetTitle().IsEmpty() && !TitleShownByChild(w)) out += " title=" + QuoteText(w->GetTitle().str());
   if (!w->GetIconName().empty() && !ZEPSysDynamicCast<ZEPDlgLock>(const_cast<ZEPDialog*>(w)))
     out += " icon=" + w->GetIconName();
   w->DumpState(out);

@@ -1,0 +1,50 @@
+// Recording hosts of each page, generated from the pages' attribute tables.
+#pragma once
+
+#include "PageRecorder.h"
+
+#include "ZEP2DBaseOptGalFrm.h"
+#include "ZEP2DBaseOptGridFrm.h"
+#include "ZEP2DBasePrimaryViewFrm.h"
+
+class RecordingGridPage : public Recording<ZEP2DBaseOptGridFrm> {
+public:
+  RecordingGridPage(HookScript& iScript, ZEPDialog* iParent)
+      : Recording<ZEP2DBaseOptGridFrm>(iScript, iParent, "GridPage") {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptGridFrm, Name, Kind)
+#include "ZEP2DBaseOptGridFrm.def"
+#undef ZEP_SETTING
+};
+
+class RecordingGalPage : public Recording<ZEP2DBaseOptGalFrm> {
+public:
+  RecordingGalPage(HookScript& iScript, ZEPDialog* iParent)
+      : Recording<ZEP2DBaseOptGalFrm>(iScript, iParent, "GeneralPage") {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptGalFrm, Name, Kind)
+#include "ZEP2DBaseOptGalFrm.def"
+#undef ZEP_SETTING
+};
+
+class RecordingPrimaryViewPage : public Recording<ZEP2DBasePrimaryViewFrm> {
+public:
+  RecordingPrimaryViewPage(HookScript& iScript, ZEPDialog* iParent)
+      : Recording<ZEP2DBasePrimaryViewFrm>(iScript, iParent) {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBasePrimaryViewFrm, Name, Kind)
+#include "ZEP2DBasePrimaryViewFrm.def"
+#undef ZEP_SETTING
+  ZEPString GetFrameIconName() override { return "I_PrimaryView"; }
+};
+
+// A page built and initialised on iParent, as the host does it.
+template <class Page> Page* OpenPage(HookScript& iScript, ZEPDialog* iParent) {
+  auto* page = new Page(iScript, iParent);
+  page->Build();
+  page->Initialize();
+  return page;
+}
