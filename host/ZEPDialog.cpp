@@ -74,6 +74,12 @@ ZEPNotification* ZEPCommand::OwnNotification(const char* iKind) {
   return _notifications.back().get();
 }
 
+std::vector<ZEPNotification*> ZEPCommand::GetNotifications() const {
+  std::vector<ZEPNotification*> out;
+  for (const auto& n : _notifications) out.push_back(n.get());
+  return out;
+}
+
 void ZEPCommand::RunCallbacks(ZEPNotification* iNotif, ZEPCommand* iSender) {
   // A callback may register or remove callbacks: run on a copy, and skip the
   // subscribers that have gone in between.

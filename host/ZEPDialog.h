@@ -62,6 +62,8 @@ public:
 
   // A notification object owned by this command, created on first use.
   ZEPNotification* OwnNotification(const char* iKind);
+  // The notification objects created so far.
+  std::vector<ZEPNotification*> GetNotifications() const;
 
 protected:
   // Calls iMethod of this object when iSender sends iNotif.

@@ -1,0 +1,108 @@
+// What every page shares: foreign senders are ignored, locks beat the page's rules.
+#include "RecordingPages.h"
+
+#include <functional>
+
+namespace {
+struct PageCase {
+  const char* name;
+  std::function<ZEPDlgFrame*(HookScript&, ZEPDialog*)> open;
+  std::vector<std::string> attributes; // from the page's table
+};
+void PrintTo(const PageCase& iCase, std::ostream* oStream) { *oStream << iCase.name; }
+
+#define ZEP_SETTING(Name, Kind) #Name,
+const std::vector<std::string> kGridAttributes = {
+#include "ZEP2DBaseOptGridFrm.def"
+};
+const std::vector<std::string> kGalAttributes = {
+#include "ZEP2DBaseOptGalFrm.def"
+};
+const std::vector<std::string> kPrimaryViewAttributes = {
+#include "ZEP2DBasePrimaryViewFrm.def"
+};
+#undef ZEP_SETTING
+
+std::vector<PageCase> Pages() {
+  return {{"Grid", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingGridPage>(s, p); }, kGridAttributes},
+          {"General", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingGalPage>(s, p); }, kGalAttributes},
+          {"PrimaryView", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingPrimaryViewPage>(s, p); },
+           kPrimaryViewAttributes}};
+}
+
+void Collect(ZEPDialog* iWidget, std::vector<ZEPDialog*>& oAll) {
+  oAll.push_back(iWidget);
+  for (ZEPDialog* c : iWidget->GetChildren()) Collect(c, oAll);
+}
+
+// Tries every user action on a widget; true when one was accepted.
+bool Operate(ZEPDialog* w) {
+  return ZEPDlgDriver::Click(w) || ZEPDlgDriver::Enter(w, 1.0) || ZEPDlgDriver::Select(w, 1) ||
+         ZEPDlgDriver::EnterText(w, "x") || ZEPDlgDriver::SelectColor(w, 1, 2, 3);
+}
+
+class EveryPage : public ZEPHostTest, public ::testing::WithParamInterface<PageCase> {};
+} // namespace
+
+TEST_P(EveryPage, NotificationFromAWidgetThatIsNoControlChangesNothing) {
+  HookScript script;
+  script.allInfoSet = true; // every optional control exists
+  ZEPDlgFrame* page = GetParam().open(script, &_root);
+  const std::string before = ZEPDlgDriver::Dump(page);
+  auto* stranger = new ZEPDlgPushButton(&_root, "pushStranger");
+  std::vector<ZEPDialog*> all;
+  Collect(page, all);
+  int delivered = 0;
+  for (ZEPDialog* w : all)
+    for (ZEPNotification* n : w->GetNotifications()) {
+      w->DeliverAs(n, stranger);
+      w->DeliverAs(n, nullptr);
+      w->DeliverAs(n, page);
+      ++delivered;
+    }
+  EXPECT_GT(delivered, 0);
+  EXPECT_TRUE(script.calls.empty());
+  EXPECT_EQ(ZEPDlgDriver::Dump(page), before);
+}
+
+TEST_P(EveryPage, LockedSettingsCannotBeChangedByAnyMeans) {
+  HookScript script;
+  script.allInfoSet = true;
+  for (const std::string& a : GetParam().attributes) {
+    script.locked.insert(a);
+    script.values[a] = {1, 1, 1, 1, 1}; // flags on, so that page rules enable dependants
+  }
+  ZEPDlgFrame* page = GetParam().open(script, &_root);
+  std::vector<ZEPDialog*> all;
+  Collect(page, all);
+  int padlocks = 0;
+  for (ZEPDialog* w : all) {
+    auto* lock = ZEPSysDynamicCast<ZEPDlgLock>(w);
+    if (!lock) continue;
+    ++padlocks;
+    EXPECT_TRUE(lock->IsLocked()) << lock->GetOwnName();
+    for (ZEPDialog* sibling : w->GetParentDialog()->GetChildren()) {
+      if (sibling == w) continue;
+      EXPECT_FALSE(sibling->IsEffectivelyEnabled()) << sibling->GetOwnName();
+      EXPECT_FALSE(Operate(sibling)) << sibling->GetOwnName();
+    }
+  }
+  EXPECT_GT(padlocks, 3);
+  EXPECT_TRUE(script.calls.empty());
+}
+
+TEST_P(EveryPage, ModuleHooksAcceptEveryChangeWithoutFailing) {
+  HookScript script;
+  ZEPDlgFrame* page = GetParam().open(script, &_root);
+  std::vector<ZEPDialog*> all;
+  Collect(page, all);
+  int operated = 0;
+  for (ZEPDialog* w : all) operated += Operate(w) ? 1 : 0;
+  EXPECT_GE(operated, 2);
+  EXPECT_EQ(script.calls.size(), static_cast<size_t>(operated) - (GetParam().name == std::string("Grid") ? 1u : 0u))
+      << "every operated control but the range combo writes once";
+  EXPECT_EQ(ZEPCheckLog::Count(), 0);
+}
+
+INSTANTIATE_TEST_SUITE_P(Pages, EveryPage, ::testing::ValuesIn(Pages()),
+                         [](const ::testing::TestParamInfo<PageCase>& i) { return std::string(i.param.name); });
