@@ -1,0 +1,96 @@
+#include "ZEPAppBinding.h"
+
+#include <algorithm>
+#include <type_traits>
+
+namespace zepapp {
+
+const std::vector<ZEPAppSetting>& AppSettings() {
+  static const std::vector<ZEPAppSetting> settings = {
+#define ZEP_APP_SETTING(Page, Attribute, Control, Repository, Stored, ...)                          \
+  {#Page, #Attribute, Control, Repository, Stored, {__VA_ARGS__}},
+#include "ZEPAppSettings.def"
+#undef ZEP_APP_SETTING
+  };
+  return settings;
+}
+
+const ZEPAppSetting* FindSetting(const std::string& iPage, const std::string& iAttribute) {
+  for (const ZEPAppSetting& s : AppSettings())
+    if (s.page == iPage && s.attribute == iAttribute) return &s;
+  return nullptr;
+}
+
+ZEPSysSettingRepository* ZEPAppBinding::Repository(const ZEPAppSetting& iSetting) const {
+  return ZEPSysSettingRepository::GetRepository(iSetting.repository.c_str(), 0);
+}
+
+namespace {
+template <ZEPAppStored S> struct StoredType;
+template <> struct StoredType<ZEPAppStored::Int> { using type = int; };
+template <> struct StoredType<ZEPAppStored::UInt> { using type = unsigned int; };
+template <> struct StoredType<ZEPAppStored::Double> { using type = double; };
+
+template <class T, class S> T FromStored(S iValue) {
+  if constexpr (std::is_same_v<T, unsigned char>) return iValue != 0 ? 1 : 0; // a flag is 0 or 1
+  else return static_cast<T>(iValue);
+}
+} // namespace
+
+template <class T> long ZEPAppBinding::Read(const char* iAttribute, T* oValues, int iCount) {
+  constexpr ZEPAppStored kind = StoredOf<T>();
+  if constexpr (kind == ZEPAppStored::Unsupported) {
+    (void)iAttribute, (void)oValues, (void)iCount;
+    return E_NOTIMPL;
+  } else {
+    using S = typename StoredType<kind>::type;
+    const ZEPAppSetting* setting = FindSetting(_page, iAttribute);
+    if (!setting || !oValues || iCount <= 0) return E_FAIL;
+    // The default first; the repository's values replace it where it has them.
+    std::vector<S> buffer(static_cast<size_t>(iCount), S());
+    for (int i = 0; i < iCount && i < static_cast<int>(setting->defaults.size()); ++i)
+      buffer[static_cast<size_t>(i)] = static_cast<S>(setting->defaults[static_cast<size_t>(i)]);
+    if (ZEPSysSettingRepository* rep = Repository(*setting)) rep->ReadAttr(setting->stored.c_str(), buffer.data(), iCount);
+    for (int i = 0; i < iCount; ++i) oValues[i] = FromStored<T>(buffer[static_cast<size_t>(i)]);
+    return S_OK;
+  }
+}
+
+template <class T> long ZEPAppBinding::Write(const char* iAttribute, const T* iValues, int iCount) {
+  constexpr ZEPAppStored kind = StoredOf<T>();
+  if constexpr (kind == ZEPAppStored::Unsupported) {
+    (void)iAttribute, (void)iValues, (void)iCount;
+    return E_NOTIMPL;
+  } else {
+    using S = typename StoredType<kind>::type;
+    const ZEPAppSetting* setting = FindSetting(_page, iAttribute);
+    if (!setting || !iValues || iCount <= 0) return E_FAIL;
+    ZEPSysSettingRepository* rep = Repository(*setting);
+    if (!rep) return E_FAIL;
+    std::vector<S> buffer(iValues, iValues + iCount);
+    return rep->WriteAttr(setting->stored.c_str(), buffer.data(), iCount) == 1 ? S_OK : E_FAIL;
+  }
+}
+
+long ZEPAppBinding::Info(const char* iAttribute, ZEPSettingInfo& oInfo) const {
+  oInfo.Reset();
+  const ZEPAppSetting* setting = FindSetting(_page, iAttribute);
+  if (ZEPSysSettingRepository* rep = setting ? Repository(*setting) : nullptr) rep->GetLockInfo(setting->stored, oInfo);
+  return S_OK;
+}
+
+// The kinds the pages use.
+template long ZEPAppBinding::Read(const char*, unsigned char*, int);
+template long ZEPAppBinding::Read(const char*, int*, int);
+template long ZEPAppBinding::Read(const char*, unsigned int*, int);
+template long ZEPAppBinding::Read(const char*, double*, int);
+template long ZEPAppBinding::Read(const char*, ZEPUnicodeString*, int);
+template long ZEPAppBinding::Read(const char*, ZEPListValZEPUnicodeString*, int);
+template long ZEPAppBinding::Write(const char*, const unsigned char*, int);
+template long ZEPAppBinding::Write(const char*, const int*, int);
+template long ZEPAppBinding::Write(const char*, const unsigned int*, int);
+template long ZEPAppBinding::Write(const char*, const double*, int);
+template long ZEPAppBinding::Write(const char*, const ZEPUnicodeString*, int);
+template long ZEPAppBinding::Write(const char*, const ZEPListValZEPUnicodeString*, int);
+
+} // namespace zepapp

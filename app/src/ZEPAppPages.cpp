@@ -1,0 +1,119 @@
+#include "ZEPAppPages.h"
+
+#include "ZEP2DBaseOptGalFrm.h"
+#include "ZEP2DBaseOptGridFrm.h"
+#include "ZEP2DBasePrimaryViewFrm.h"
+
+#include <set>
+
+namespace zepapp {
+namespace {
+// Each page: a subclass whose hooks are bound through its table.
+class GridPage : public ZEP2DBaseOptGridFrm {
+public:
+  explicit GridPage(ZEPDialog* iParent) : ZEP2DBaseOptGridFrm(iParent, "GridPage") {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)
+#include "ZEP2DBaseOptGridFrm.def"
+#undef ZEP_SETTING
+
+private:
+  ZEPAppBinding _binding{"Grid"};
+};
+
+class GeneralPage : public ZEP2DBaseOptGalFrm {
+public:
+  explicit GeneralPage(ZEPDialog* iParent) : ZEP2DBaseOptGalFrm(iParent, "GeneralPage") {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)
+#include "ZEP2DBaseOptGalFrm.def"
+#undef ZEP_SETTING
+
+private:
+  ZEPAppBinding _binding{"General"};
+};
+
+class PrimaryViewPage : public ZEP2DBasePrimaryViewFrm {
+public:
+  explicit PrimaryViewPage(ZEPDialog* iParent) : ZEP2DBasePrimaryViewFrm(iParent) {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)
+#include "ZEP2DBasePrimaryViewFrm.def"
+#undef ZEP_SETTING
+  ZEPString GetFrameIconName() override { return "I_PrimaryView"; }
+
+private:
+  ZEPAppBinding _binding{"PrimaryView"};
+};
+
+template <class Page> ZEPDlgFrame* Open(ZEPDialog* iParent) {
+  auto* page = new Page(iParent);
+  page->Build();
+  page->Initialize();
+  return page;
+}
+
+#define ZEP_SETTING(Name, Kind) {#Name, StoredOf<ZEP_TYPE_##Kind>()},
+const std::map<std::string, ZEPAppStored> kGridStored = {
+#include "ZEP2DBaseOptGridFrm.def"
+};
+const std::map<std::string, ZEPAppStored> kGeneralStored = {
+#include "ZEP2DBaseOptGalFrm.def"
+};
+const std::map<std::string, ZEPAppStored> kPrimaryViewStored = {
+#include "ZEP2DBasePrimaryViewFrm.def"
+};
+#undef ZEP_SETTING
+} // namespace
+
+const std::vector<ZEPAppPage>& AppPages() {
+  static const std::vector<ZEPAppPage> pages = {
+      {"general", "General", "General", &Open<GeneralPage>, kGeneralStored},
+      {"grid", "Grid", "Grid", &Open<GridPage>, kGridStored},
+      {"primary-view", "Primary view", "PrimaryView", &Open<PrimaryViewPage>, kPrimaryViewStored},
+  };
+  return pages;
+}
+
+const ZEPAppPage* FindPage(const std::string& iName) {
+  for (const ZEPAppPage& p : AppPages())
+    if (p.name == iName) return &p;
+  return nullptr;
+}
+
+std::vector<std::string> AppRepositories() {
+  std::set<std::string> names;
+  for (const ZEPAppSetting& s : AppSettings()) names.insert(s.repository);
+  return {names.begin(), names.end()};
+}
+
+void ApplyDefaults() {
+  for (const ZEPAppSetting& s : AppSettings()) {
+    ZEPSysSettingRepository* rep = ZEPSysSettingRepository::GetRepository(s.repository.c_str(), 0);
+    if (!rep) rep = ZEPSysSettingRepository::Open(s.repository);
+    if (rep->Defaults().count(s.stored)) continue; // the administrator's default wins
+    const ZEPAppPage* page = nullptr;
+    for (const ZEPAppPage& p : AppPages())
+      if (p.table == s.page) page = &p;
+    auto kind = page ? page->stored.find(s.attribute) : std::map<std::string, ZEPAppStored>::const_iterator();
+    if (!page || kind == page->stored.end()) continue;
+    switch (kind->second) {
+    case ZEPAppStored::Int:
+      rep->SetDefault(s.stored, std::vector<int>(s.defaults.begin(), s.defaults.end()));
+      break;
+    case ZEPAppStored::UInt:
+      rep->SetDefault(s.stored, std::vector<unsigned int>(s.defaults.begin(), s.defaults.end()));
+      break;
+    case ZEPAppStored::Double:
+      rep->SetDefault(s.stored, s.defaults);
+      break;
+    case ZEPAppStored::Unsupported:
+      break;
+    }
+  }
+}
+
+} // namespace zepapp

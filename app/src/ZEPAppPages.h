@@ -1,0 +1,33 @@
+// The pages of the application's drafting options dialog, bound to the settings store.
+#pragma once
+
+#include "ZEPAppBinding.h"
+
+#include <functional>
+#include <map>
+#include <string>
+#include <vector>
+
+namespace zepapp {
+
+struct ZEPAppPage {
+  std::string name;     // command-line name: "grid"
+  std::string title;    // "Grid"
+  std::string table;    // the page's name in ZEPAppSettings.def: "Grid"
+  // Constructs the page on iParent, builds and initialises it.
+  std::function<ZEPDlgFrame*(ZEPDialog* iParent)> open;
+  // How each attribute of the page is stored, from the page's table.
+  std::map<std::string, ZEPAppStored> stored;
+};
+
+const std::vector<ZEPAppPage>& AppPages();
+const ZEPAppPage* FindPage(const std::string& iName);
+
+// The repositories the pages use, each opened once.
+std::vector<std::string> AppRepositories();
+
+// Puts the application's default of every setting into its repository, unless the
+// administrator's file gave one. Call once the files are loaded.
+void ApplyDefaults();
+
+} // namespace zepapp

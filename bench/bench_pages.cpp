@@ -1,0 +1,62 @@
+// Page costs: building and initialising each page, and one user change reaching its hook.
+#include "ZEP2DBaseOptGalFrm.h"
+#include "ZEP2DBaseOptGridFrm.h"
+#include "ZEP2DBasePrimaryViewFrm.h"
+
+#include <benchmark/benchmark.h>
+
+namespace {
+// A host whose hooks answer at once: what is measured is the page and the toolkit.
+#define ZEP_SETTING(Name, Kind)                                                                     \
+  long SetSys##Name(ZEP_SETPARAMS(Kind)) override {                                                 \
+    ++_writes;                                                                                      \
+    return S_OK;                                                                                    \
+  }                                                                                                 \
+  long GetSys##Name##Info(ZEPSettingInfo&) override { return S_OK; }
+
+struct GridPage : ZEP2DBaseOptGridFrm {
+  explicit GridPage(ZEPDialog* iParent) : ZEP2DBaseOptGridFrm(iParent, "GridPage") {}
+  long _writes = 0;
+#include "ZEP2DBaseOptGridFrm.def"
+};
+struct GalPage : ZEP2DBaseOptGalFrm {
+  explicit GalPage(ZEPDialog* iParent) : ZEP2DBaseOptGalFrm(iParent, "GeneralPage") {}
+  long _writes = 0;
+#include "ZEP2DBaseOptGalFrm.def"
+};
+struct PrimaryViewPage : ZEP2DBasePrimaryViewFrm {
+  explicit PrimaryViewPage(ZEPDialog* iParent) : ZEP2DBasePrimaryViewFrm(iParent) {}
+  long _writes = 0;
+  ZEPString GetFrameIconName() override { return "I_PrimaryView"; }
+#include "ZEP2DBasePrimaryViewFrm.def"
+};
+#undef ZEP_SETTING
+
+template <class Page> void BuildAndInitialize(benchmark::State& state) {
+  ZEPDlgWindow root(nullptr, "root", 0);
+  for (auto _ : state) {
+    auto* page = new Page(&root);
+    page->Build();
+    page->Initialize();
+    benchmark::DoNotOptimize(page);
+    delete page;
+  }
+}
+
+template <class Page> void ClickToHook(benchmark::State& state, const char* iControl) {
+  ZEPDlgWindow root(nullptr, "root", 0);
+  auto* page = new Page(&root);
+  page->Build();
+  page->Initialize();
+  ZEPDialog* control = ZEPDlgDriver::FindControl(page, iControl);
+  for (auto _ : state) benchmark::DoNotOptimize(ZEPDlgDriver::Click(control));
+  if (page->_writes != static_cast<long>(state.iterations())) state.SkipWithError("a click did not reach its hook");
+}
+} // namespace
+
+BENCHMARK_TEMPLATE(BuildAndInitialize, GridPage);
+BENCHMARK_TEMPLATE(BuildAndInitialize, GalPage);
+BENCHMARK_TEMPLATE(BuildAndInitialize, PrimaryViewPage);
+BENCHMARK_CAPTURE(ClickToHook<GridPage>, checkSnap, "checkSnap");
+BENCHMARK_CAPTURE(ClickToHook<GalPage>, checkViewFrame, "checkViewFrame");
+BENCHMARK_CAPTURE(ClickToHook<PrimaryViewPage>, chkResizeViewBoxOn3D, "chkResizeViewBoxOn3D");
