@@ -9,8 +9,8 @@ const char* const kLengthUnits[] = {"METER",   "micron",  "MM",      "CM", "KM",
 const char* const kAngleUnits[] = {"RADIAN", "DEGREE", "GRADE", "TURN"};
 
 template <size_t N> bool Known(const char* const (&iTable)[N], const ZEPUnicodeString& iName) {
-  return iName.IsEmpty() ||
-         std::any_of(std::begin(iTable), std::end(iTable), [&](const char* n) { return iName == n; });
+  return iName.IsEmpty() || std::any_of(std::begin(iTable), std::end(iTable),
+                                        [&](const char* n) { return iName == n; });
 }
 
 struct UnitsState {
@@ -55,7 +55,8 @@ ZEPICkeType_var ZEPParmDictionary::AngleType() { return TypeOf(false); }
 
 bool ZEPCkeUnitsSetup::SetLengthUnit(const ZEPUnicodeString& iName) {
   if (!Known(kLengthUnits, iName)) return false;
-  for (ZEPUnicodeString& unit : State().length) unit = iName;
+  for (ZEPUnicodeString& unit : State().length)
+    unit = iName;
   return true;
 }
 

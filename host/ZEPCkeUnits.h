@@ -23,7 +23,8 @@ public:
   ZEPCkeVar(std::nullptr_t) {}
   explicit ZEPCkeVar(std::shared_ptr<T> iObject) : _spObject(std::move(iObject)) {}
   template <class U>
-  ZEPCkeVar(const ZEPCkeVar<U>& iOther) : _spObject(std::dynamic_pointer_cast<T>(iOther.Object())) {}
+  ZEPCkeVar(const ZEPCkeVar<U>& iOther)
+      : _spObject(std::dynamic_pointer_cast<T>(iOther.Object())) {}
 
   T* operator->() const { return _spObject.get(); }
   bool operator!() const { return !_spObject; }

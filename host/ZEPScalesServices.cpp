@@ -15,7 +15,8 @@ ScalesState& State() {
 
 ZEPRawCollint ZEPICkeScalesServices::GetActivatedScales() const {
   ZEPRawCollint scales;
-  for (int s : State().activated) scales.Append(s);
+  for (int s : State().activated)
+    scales.Append(s);
   return scales;
 }
 
@@ -34,7 +35,9 @@ ZEPICkeScalesServices_var ZEPGlobalFunctions2::GetScalesServices() {
   return ZEPICkeScalesServices_var(std::make_shared<ZEPICkeScalesServices>());
 }
 
-void ZEPScalesSetup::SetActivatedScales(const std::vector<int>& iScales) { State().activated = iScales; }
+void ZEPScalesSetup::SetActivatedScales(const std::vector<int>& iScales) {
+  State().activated = iScales;
+}
 void ZEPScalesSetup::SetCurrentScale(int iScale) { State().current = iScale; }
 void ZEPScalesSetup::SetAvailable(bool iAvailable) { State().available = iAvailable; }
 int ZEPScalesSetup::CurrentScaleRequests() { return State().currentRequests; }

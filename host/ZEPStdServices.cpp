@@ -20,7 +20,8 @@ StdState& State() {
 
 // Standard types are identifiers; anything else would reach outside the folder.
 bool SafeType(const std::string& iType) {
-  return !iType.empty() && iType != "." && iType != ".." && iType.find_first_of("/\\") == std::string::npos;
+  return !iType.empty() && iType != "." && iType != ".." &&
+         iType.find_first_of("/\\") == std::string::npos;
 }
 
 ZEPListValZEPUnicodeString* ListFolder(const std::string& iType) {
@@ -35,7 +36,8 @@ ZEPListValZEPUnicodeString* ListFolder(const std::string& iType) {
   if (ec) return nullptr;
   std::sort(names.begin(), names.end());
   auto* list = new ZEPListValZEPUnicodeString;
-  for (const std::string& n : names) list->Append(ZEPUnicodeString(n));
+  for (const std::string& n : names)
+    list->Append(ZEPUnicodeString(n));
   return list;
 }
 } // namespace
@@ -45,7 +47,8 @@ ZEPListValZEPUnicodeString* ZEPStdServices::GetStandardFiles(ZEPUnicodeString& i
   if (it == State().lists.end()) return ListFolder(iType.str());
   if (!it->second) return nullptr;
   auto* list = new ZEPListValZEPUnicodeString;
-  for (const ZEPUnicodeString& n : *it->second) list->Append(n);
+  for (const ZEPUnicodeString& n : *it->second)
+    list->Append(n);
   return list;
 }
 
@@ -55,7 +58,8 @@ std::string ZEPStdSetup::GetStandardsFolder() {
   return State().folder.empty() ? ZEPMsgCatalog::ResourceDir() + "/standards" : State().folder;
 }
 
-void ZEPStdSetup::SetStandardFiles(const ZEPUnicodeString& iType, const std::vector<ZEPUnicodeString>& iFiles) {
+void ZEPStdSetup::SetStandardFiles(const ZEPUnicodeString& iType,
+                                   const std::vector<ZEPUnicodeString>& iFiles) {
   State().lists[iType.str()] = std::make_unique<std::vector<ZEPUnicodeString>>(iFiles);
 }
 

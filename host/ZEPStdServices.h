@@ -22,7 +22,8 @@ public:
   static void SetStandardsFolder(const std::string& iFolder);
   static std::string GetStandardsFolder();
   // These names, as given, for that type instead of its folder.
-  static void SetStandardFiles(const ZEPUnicodeString& iType, const std::vector<ZEPUnicodeString>& iFiles);
+  static void SetStandardFiles(const ZEPUnicodeString& iType,
+                               const std::vector<ZEPUnicodeString>& iFiles);
   // The container answers no list for that type.
   static void SetNoList(const ZEPUnicodeString& iType);
   // The standards folder of the resources, no explicit lists.

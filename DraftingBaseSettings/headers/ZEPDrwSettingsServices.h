@@ -19,22 +19,27 @@ public:
   // ---- Value transfer --------------------------------------------------------------------
   // GetValueFrom*: E_FAIL, output untouched, unless iSender is the control's inner control
   // (a page's Write tries its controls in turn); else the value is read and S_OK answered.
-  static long GetValueFromCheckButton(ZEPDrwLockCheckButton* iControl, ZEPCommand* iSender, unsigned char& oValue);
+  static long GetValueFromCheckButton(ZEPDrwLockCheckButton* iControl, ZEPCommand* iSender,
+                                      unsigned char& oValue);
   static long GetValueFromCombo(ZEPDrwLockCombo* iControl, ZEPCommand* iSender, int& oIndex);
-  static long GetValueFromCombo(ZEPDrwLockCombo* iControl, ZEPCommand* iSender, ZEPUnicodeString& oText);
+  static long GetValueFromCombo(ZEPDrwLockCombo* iControl, ZEPCommand* iSender,
+                                ZEPUnicodeString& oText);
   // E_FAIL, outputs untouched, for a component above 255.
   static long GetValueFromComboColor(ZEPDrwLockComboColor* iControl, ZEPCommand* iSender, int& oRed,
                                      int& oGreen, int& oBlue);
-  static long GetValueFromComboSymbol(ZEPDrwLockComboSymbol* iControl, ZEPCommand* iSender, int& oValue);
+  static long GetValueFromComboSymbol(ZEPDrwLockComboSymbol* iControl, ZEPCommand* iSender,
+                                      int& oValue);
   static long GetValueFromIconBox(ZEPDrwLockIconBox* iControl, ZEPCommand* iSender, int& oValue);
-  static long GetValueFromLineType(ZEPDrwLockComboDashed* iControl, ZEPCommand* iSender, int& oValue);
+  static long GetValueFromLineType(ZEPDrwLockComboDashed* iControl, ZEPCommand* iSender,
+                                   int& oValue);
   static long GetValueFromSlider(ZEPDrwLockSlider* iControl, ZEPCommand* iSender, float& oValue);
   // Truncated toward zero (clamped to the int range) and shown back in the spinner.
   static long GetValueFromSpinner(ZEPDrwLockSpinner* iControl, ZEPCommand* iSender, int& oValue);
   // The spinner's value times iFactor (1000.0: metres to millimetres).
-  static long GetValueFromSpinner(ZEPDrwLockSpinner* iControl, ZEPCommand* iSender, const double& iFactor,
-                                  double& oValue);
-  static long GetValueFromThickness(ZEPDrwLockComboWeight* iControl, ZEPCommand* iSender, int& oValue);
+  static long GetValueFromSpinner(ZEPDrwLockSpinner* iControl, ZEPCommand* iSender,
+                                  const double& iFactor, double& oValue);
+  static long GetValueFromThickness(ZEPDrwLockComboWeight* iControl, ZEPCommand* iSender,
+                                    int& oValue);
 
   // Update*: shows the value; E_FAIL for a null control (and the checks noted).
   static long UpdateCheckButton(ZEPDrwLockCheckButton* iControl, const unsigned char& iValue);
@@ -56,14 +61,17 @@ public:
 
   // ---- Units and value ranges ------------------------------------------------------------
   // The user's length unit at that range, or the paper length unit when iPaper is not 0.
-  static void SetLengthUnitToDlgControl(ZEPDlgControl* iDlgControl, ZEPCkeScale iRange, unsigned char iPaper,
-                                        int iPrecision, unsigned char iPrecisionFlag);
-  static void SetAngleUnitToDlgControl(ZEPDlgControl* iDlgControl, int iPrecision, unsigned char iPrecisionFlag);
+  static void SetLengthUnitToDlgControl(ZEPDlgControl* iDlgControl, ZEPCkeScale iRange,
+                                        unsigned char iPaper, int iPrecision,
+                                        unsigned char iPrecisionFlag);
+  static void SetAngleUnitToDlgControl(ZEPDlgControl* iDlgControl, int iPrecision,
+                                       unsigned char iPrecisionFlag);
   // Limits in millimetres; model lengths follow the range, paper lengths do not.
-  static void SetLengthMinMaxStep(ZEPDlgSpinner* iDlgSpinner, ZEPCkeScale iRange, unsigned char iPaper,
-                                  double iMin, double iMax, double iStep);
+  static void SetLengthMinMaxStep(ZEPDlgSpinner* iDlgSpinner, ZEPCkeScale iRange,
+                                  unsigned char iPaper, double iMin, double iMax, double iStep);
   // Limits in degrees.
-  static void SetAngleMinMaxStep(ZEPDlgSpinner* iDlgSpinner, double iMin, double iMax, double iStep);
+  static void SetAngleMinMaxStep(ZEPDlgSpinner* iDlgSpinner, double iMin, double iMax,
+                                 double iStep);
 
   // ---- Drafting standard files -----------------------------------------------------------
   // The sorted names of the XML files of that standard type, without ".xml" when

@@ -59,8 +59,9 @@ int ZEP2DBaseRangeCmb::SetSelect(int iIdx, int /*iNotify*/) {
     return -1;
   }
   if (ZEPDlgCombo::SetSelect(spScaleServices->GetScaleName(GetMatchingRange(iIdx)), 0) < 0) {
-    Check_TRUE_Failed__("0<=ZEPDlgCombo::SetSelect(spScaleServices->GetScaleName(GetMatchingRange(iIdx)), 0)",
-                        kPath, __LINE__, nullptr);
+    Check_TRUE_Failed__(
+        "0<=ZEPDlgCombo::SetSelect(spScaleServices->GetScaleName(GetMatchingRange(iIdx)), 0)",
+        kPath, __LINE__, nullptr);
     return -1;
   }
   return iIdx;

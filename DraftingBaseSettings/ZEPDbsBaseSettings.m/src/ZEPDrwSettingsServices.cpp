@@ -32,18 +32,24 @@ template <class C, class F> long UpdateIfControl(C* iControl, F iUpdate) {
 const struct {
   const char* name;
   ZEPDlgUnit unit;
-} kLengthUnits[] = {{"METER", 43}, {"micron", 44}, {"MM", 45},      {"CM", 46},      {"KM", 47},
-                    {"INCH", 48},  {"FOOT", 49},   {"F_I_F64", 50}, {"F_I_F16", 51}, {"F_I_DEC", 52}};
+} kLengthUnits[] = {{"METER", 43},   {"micron", 44}, {"MM", 45},   {"CM", 46},
+                    {"KM", 47},      {"INCH", 48},   {"FOOT", 49}, {"F_I_F64", 50},
+                    {"F_I_F16", 51}, {"F_I_DEC", 52}};
 const ZEPDlgUnit kMillimetre = 45, kRadian = 11, kDegree = 12, kGrade = 15;
 
 // Length factor of a scale range: model lengths at that range are this many times larger.
 double RangeFactor(ZEPCkeScale iRange) {
   switch (iRange) {
-  case 2: return 100.0;
-  case 3: return 10000.0;
-  case 4: return 0.01;
-  case 5: return 0.0001;
-  default: return 1.0;
+  case 2:
+    return 100.0;
+  case 3:
+    return 10000.0;
+  case 4:
+    return 0.01;
+  case 5:
+    return 0.0001;
+  default:
+    return 1.0;
   }
 }
 
@@ -64,7 +70,8 @@ ZEPUnicodeString UserUnit(const ZEPICkeType_var& iType, ZEPCkeScale iScale, cons
   return spUnit->GetUnitName();
 }
 
-void ApplyUnit(ZEPDlgControl* iDlgControl, ZEPDlgUnit iUnit, int iPrecision, unsigned char iPrecisionFlag) {
+void ApplyUnit(ZEPDlgControl* iDlgControl, ZEPDlgUnit iUnit, int iPrecision,
+               unsigned char iPrecisionFlag) {
   iDlgControl->SetUnit(iUnit);
   if (iPrecision > 0) iDlgControl->SetPrecision(iPrecision, iPrecisionFlag);
 }
@@ -84,15 +91,16 @@ bool TakesDoubleLimits(ZEPDlgSpinner* iDlgSpinner) {
 } // namespace
 
 // ---- value transfer ---------------------------------------------------------------------------
-long ZEPDrwSettingsServices::GetValueFromCheckButton(ZEPDrwLockCheckButton* iControl, ZEPCommand* iSender,
-                                                     unsigned char& oValue) {
+long ZEPDrwSettingsServices::GetValueFromCheckButton(ZEPDrwLockCheckButton* iControl,
+                                                     ZEPCommand* iSender, unsigned char& oValue) {
   return ReadIfSender(iControl, iSender, [&](ZEPDrwLockCheckButton& c) {
     oValue = c.GetState() == ZEPDlgChecked ? 1 : 0;
     return S_OK;
   });
 }
 
-long ZEPDrwSettingsServices::GetValueFromCombo(ZEPDrwLockCombo* iControl, ZEPCommand* iSender, int& oIndex) {
+long ZEPDrwSettingsServices::GetValueFromCombo(ZEPDrwLockCombo* iControl, ZEPCommand* iSender,
+                                               int& oIndex) {
   return ReadIfSender(iControl, iSender, [&](ZEPDrwLockCombo& c) {
     ZEPDlgCombo* pCombo = c.GetCombo();
     if (!pCombo) return E_FAIL;
@@ -111,8 +119,9 @@ long ZEPDrwSettingsServices::GetValueFromCombo(ZEPDrwLockCombo* iControl, ZEPCom
   });
 }
 
-long ZEPDrwSettingsServices::GetValueFromComboColor(ZEPDrwLockComboColor* iControl, ZEPCommand* iSender,
-                                                    int& oRed, int& oGreen, int& oBlue) {
+long ZEPDrwSettingsServices::GetValueFromComboColor(ZEPDrwLockComboColor* iControl,
+                                                    ZEPCommand* iSender, int& oRed, int& oGreen,
+                                                    int& oBlue) {
   return ReadIfSender(iControl, iSender, [&](ZEPDrwLockComboColor& c) {
     unsigned int red = 0, green = 0, blue = 0;
     c.GetSelectedColor(&red, &green, &blue);
@@ -124,41 +133,47 @@ long ZEPDrwSettingsServices::GetValueFromComboColor(ZEPDrwLockComboColor* iContr
   });
 }
 
-long ZEPDrwSettingsServices::GetValueFromComboSymbol(ZEPDrwLockComboSymbol* iControl, ZEPCommand* iSender,
-                                                     int& oValue) {
+long ZEPDrwSettingsServices::GetValueFromComboSymbol(ZEPDrwLockComboSymbol* iControl,
+                                                     ZEPCommand* iSender, int& oValue) {
   return ReadIfSender(iControl, iSender, [&](ZEPDrwLockComboSymbol& c) {
     oValue = static_cast<int>(c.GetSelect());
     return S_OK;
   });
 }
 
-long ZEPDrwSettingsServices::GetValueFromIconBox(ZEPDrwLockIconBox* iControl, ZEPCommand* iSender, int& oValue) {
+long ZEPDrwSettingsServices::GetValueFromIconBox(ZEPDrwLockIconBox* iControl, ZEPCommand* iSender,
+                                                 int& oValue) {
   return ReadIfSender(iControl, iSender, [&](ZEPDrwLockIconBox& c) {
     oValue = c.GetSelect();
     return S_OK;
   });
 }
 
-long ZEPDrwSettingsServices::GetValueFromLineType(ZEPDrwLockComboDashed* iControl, ZEPCommand* iSender,
-                                                  int& oValue) {
+long ZEPDrwSettingsServices::GetValueFromLineType(ZEPDrwLockComboDashed* iControl,
+                                                  ZEPCommand* iSender, int& oValue) {
   return ReadIfSender(iControl, iSender, [&](ZEPDrwLockComboDashed& c) {
     oValue = static_cast<int>(c.GetSelect());
     return S_OK;
   });
 }
 
-long ZEPDrwSettingsServices::GetValueFromSlider(ZEPDrwLockSlider* iControl, ZEPCommand* iSender, float& oValue) {
+long ZEPDrwSettingsServices::GetValueFromSlider(ZEPDrwLockSlider* iControl, ZEPCommand* iSender,
+                                                float& oValue) {
   return ReadIfSender(iControl, iSender, [&](ZEPDrwLockSlider& c) {
     oValue = c.GetCurrentValue();
     return S_OK;
   });
 }
 
-long ZEPDrwSettingsServices::GetValueFromSpinner(ZEPDrwLockSpinner* iControl, ZEPCommand* iSender, int& oValue) {
+long ZEPDrwSettingsServices::GetValueFromSpinner(ZEPDrwLockSpinner* iControl, ZEPCommand* iSender,
+                                                 int& oValue) {
   return ReadIfSender(iControl, iSender, [&](ZEPDrwLockSpinner& c) {
     // Converting a double outside the int range is undefined: such values are clamped.
     double value = std::trunc(c.GetValue());
-    oValue = value >= INT_MAX ? INT_MAX : value <= INT_MIN ? INT_MIN : std::isnan(value) ? 0 : static_cast<int>(value);
+    oValue = value >= INT_MAX    ? INT_MAX
+             : value <= INT_MIN  ? INT_MIN
+             : std::isnan(value) ? 0
+                                 : static_cast<int>(value);
     c.SetValue(oValue, 0);
     return S_OK;
   });
@@ -172,15 +187,16 @@ long ZEPDrwSettingsServices::GetValueFromSpinner(ZEPDrwLockSpinner* iControl, ZE
   });
 }
 
-long ZEPDrwSettingsServices::GetValueFromThickness(ZEPDrwLockComboWeight* iControl, ZEPCommand* iSender,
-                                                   int& oValue) {
+long ZEPDrwSettingsServices::GetValueFromThickness(ZEPDrwLockComboWeight* iControl,
+                                                   ZEPCommand* iSender, int& oValue) {
   return ReadIfSender(iControl, iSender, [&](ZEPDrwLockComboWeight& c) {
     oValue = static_cast<int>(c.GetSelect());
     return S_OK;
   });
 }
 
-long ZEPDrwSettingsServices::UpdateCheckButton(ZEPDrwLockCheckButton* iControl, const unsigned char& iValue) {
+long ZEPDrwSettingsServices::UpdateCheckButton(ZEPDrwLockCheckButton* iControl,
+                                               const unsigned char& iValue) {
   return UpdateIfControl(iControl, [&](ZEPDrwLockCheckButton& c) {
     c.SetState(iValue != 0 ? ZEPDlgChecked : ZEPDlgUnchecked, 0);
   });
@@ -201,28 +217,32 @@ long ZEPDrwSettingsServices::UpdateCombo(ZEPDrwLockCombo* iControl, const ZEPUni
 }
 
 // A negative int becomes a huge unsigned value, refused with the components above 255.
-long ZEPDrwSettingsServices::UpdateComboColor(ZEPDrwLockComboColor* iControl, const int& iRed, const int& iGreen,
-                                              const int& iBlue) {
-  return UpdateComboColor(iControl, static_cast<unsigned int>(iRed), static_cast<unsigned int>(iGreen),
-                          static_cast<unsigned int>(iBlue));
+long ZEPDrwSettingsServices::UpdateComboColor(ZEPDrwLockComboColor* iControl, const int& iRed,
+                                              const int& iGreen, const int& iBlue) {
+  return UpdateComboColor(iControl, static_cast<unsigned int>(iRed),
+                          static_cast<unsigned int>(iGreen), static_cast<unsigned int>(iBlue));
 }
 
-long ZEPDrwSettingsServices::UpdateComboColor(ZEPDrwLockComboColor* iControl, const unsigned int& iRed,
-                                              const unsigned int& iGreen, const unsigned int& iBlue) {
+long ZEPDrwSettingsServices::UpdateComboColor(ZEPDrwLockComboColor* iControl,
+                                              const unsigned int& iRed, const unsigned int& iGreen,
+                                              const unsigned int& iBlue) {
   if (!iControl || iRed > 255 || iGreen > 255 || iBlue > 255) return E_FAIL;
   iControl->SetSelectedColor(iRed, iGreen, iBlue);
   return S_OK;
 }
 
-long ZEPDrwSettingsServices::UpdateComboLineType(ZEPDrwLockComboDashed* iControl, const unsigned int& iValue) {
+long ZEPDrwSettingsServices::UpdateComboLineType(ZEPDrwLockComboDashed* iControl,
+                                                 const unsigned int& iValue) {
   return UpdateIfControl(iControl, [&](ZEPDrwLockComboDashed& c) { c.SetSelect(iValue); });
 }
 
-long ZEPDrwSettingsServices::UpdateComboSymbol(ZEPDrwLockComboSymbol* iControl, const unsigned int& iValue) {
+long ZEPDrwSettingsServices::UpdateComboSymbol(ZEPDrwLockComboSymbol* iControl,
+                                               const unsigned int& iValue) {
   return UpdateIfControl(iControl, [&](ZEPDrwLockComboSymbol& c) { c.SetSelect(iValue); });
 }
 
-long ZEPDrwSettingsServices::UpdateComboThickness(ZEPDrwLockComboWeight* iControl, const unsigned int& iValue) {
+long ZEPDrwSettingsServices::UpdateComboThickness(ZEPDrwLockComboWeight* iControl,
+                                                  const unsigned int& iValue) {
   return UpdateIfControl(iControl, [&](ZEPDrwLockComboWeight& c) { c.SetSelect(iValue); });
 }
 
@@ -242,7 +262,8 @@ long ZEPDrwSettingsServices::UpdateSpinner(ZEPDrwLockSpinner* iControl, const do
 ZEPUnicodeString ZEPDrwSettingsServices::GetLengthUnit(unsigned char iPaper, ZEPCkeScale iRange) {
   if (!iPaper) {
     ZEPCkeValueServices::ForceDictionaryInit();
-    return UserUnit(ZEPParmDictionary::LengthType(), iRange, "MM", "spLengthMagnitudeCke", "spLengthUnit");
+    return UserUnit(ZEPParmDictionary::LengthType(), iRange, "MM", "spLengthMagnitudeCke",
+                    "spLengthUnit");
   }
   ZEPSysSettingRepository* pRep = ZEPSysSettingRepository::GetRepository("DraftingOptions", 0);
   if (!pRep) {
@@ -256,12 +277,13 @@ ZEPUnicodeString ZEPDrwSettingsServices::GetLengthUnit(unsigned char iPaper, ZEP
 
 ZEPUnicodeString ZEPDrwSettingsServices::GetAngleUnit() {
   ZEPCkeValueServices::ForceDictionaryInit();
-  return UserUnit(ZEPParmDictionary::AngleType(), ZEPCkeScaleNormal, "DEGREE", "spAngleMagnitudeCke",
-                  "spAngleUnit");
+  return UserUnit(ZEPParmDictionary::AngleType(), ZEPCkeScaleNormal, "DEGREE",
+                  "spAngleMagnitudeCke", "spAngleUnit");
 }
 
-void ZEPDrwSettingsServices::SetLengthUnitToDlgControl(ZEPDlgControl* iDlgControl, ZEPCkeScale iRange,
-                                                       unsigned char iPaper, int iPrecision,
+void ZEPDrwSettingsServices::SetLengthUnitToDlgControl(ZEPDlgControl* iDlgControl,
+                                                       ZEPCkeScale iRange, unsigned char iPaper,
+                                                       int iPrecision,
                                                        unsigned char iPrecisionFlag) {
   if (!iDlgControl) return Check_Pointer_Failed__("iDlgControl", kPath, __LINE__, nullptr);
   ZEPUnicodeString name = GetLengthUnit(iPaper, iRange);
@@ -284,7 +306,8 @@ void ZEPDrwSettingsServices::SetAngleUnitToDlgControl(ZEPDlgControl* iDlgControl
 }
 
 void ZEPDrwSettingsServices::SetLengthMinMaxStep(ZEPDlgSpinner* iDlgSpinner, ZEPCkeScale iRange,
-                                                 unsigned char iPaper, double iMin, double iMax, double iStep) {
+                                                 unsigned char iPaper, double iMin, double iMax,
+                                                 double iStep) {
   if (!TakesDoubleLimits(iDlgSpinner)) return;
   ZEPUnicodeString name = GetLengthUnit(iPaper, iRange);
   // Paper inches get a finer step; the step never follows the range.
@@ -299,15 +322,17 @@ void ZEPDrwSettingsServices::SetLengthMinMaxStep(ZEPDlgSpinner* iDlgSpinner, ZEP
   iDlgSpinner->SetMinMaxStep(iMin, iMax, iStep, 0);
 }
 
-void ZEPDrwSettingsServices::SetAngleMinMaxStep(ZEPDlgSpinner* iDlgSpinner, double iMin, double iMax,
-                                                double iStep) {
+void ZEPDrwSettingsServices::SetAngleMinMaxStep(ZEPDlgSpinner* iDlgSpinner, double iMin,
+                                                double iMax, double iStep) {
   if (!TakesDoubleLimits(iDlgSpinner)) return;
   const double degreesToRadians = 0.017453292519943295;
-  iDlgSpinner->SetMinMaxStep(iMin * degreesToRadians, iMax * degreesToRadians, iStep * degreesToRadians, 0);
+  iDlgSpinner->SetMinMaxStep(iMin * degreesToRadians, iMax * degreesToRadians,
+                             iStep * degreesToRadians, 0);
 }
 
 // ---- drafting standard files --------------------------------------------------------------
-long ZEPDrwSettingsServices::GetXmlFilesNames(const ZEPUnicodeString& iType, unsigned char iKeepExtension,
+long ZEPDrwSettingsServices::GetXmlFilesNames(const ZEPUnicodeString& iType,
+                                              unsigned char iKeepExtension,
                                               ZEPListValZEPUnicodeString& oNames) {
   oNames.RemoveAll(1);
   ZEPUnicodeString type = iType;
