@@ -84,14 +84,15 @@ long WriteFileAtomically(ZEPAppFileOps& iOps, const std::string& iPath, const st
   }
   std::error_code ec;
   fs::path target(iPath);
-  // Renaming over a symbolic link would replace the link; write where it points instead.
-  if (fs::is_symlink(target, ec)) {
-    fs::path resolved = fs::weakly_canonical(target, ec);
-    if (ec) {
-      oError = "cannot follow the link " + iPath + ": " + ec.message();
+  // Renaming over a symbolic link would replace the link; write where it points instead, even
+  // when that file does not exist yet.
+  for (int hops = 0; fs::is_symlink(target, ec); ++hops) {
+    fs::path next = fs::read_symlink(target, ec);
+    if (ec || hops == 40) {
+      oError = "cannot follow the link " + target.string() + ": " + (ec ? ec.message() : "too many links");
       return E_FAIL;
     }
-    target = resolved;
+    target = next.is_absolute() ? next : target.parent_path() / next;
   }
   fs::path dir = target.parent_path();
   if (dir.empty()) dir = ".";

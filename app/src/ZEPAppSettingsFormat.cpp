@@ -225,7 +225,7 @@ std::string Describe(const json& j) {
 // Checks a parsed document against the format, noting each fault at its place.
 class Checker {
 public:
-  Checker(const Positions& iPos, bool iAdmin) : _pos(iPos), _admin(iAdmin) {}
+  Checker(Positions iPos, bool iAdmin) : _pos(std::move(iPos)), _admin(iAdmin) {}
 
   void Document(const json& iRoot, ZEPAppSettingsDoc& oDoc) {
     if (_pos.duplicateAt != kNone)
@@ -367,7 +367,7 @@ private:
     else oEntry.value = std::move(u);
   }
 
-  const Positions& _pos;
+  const Positions _pos;
   bool _admin;
   std::vector<std::pair<std::size_t, std::string>> _faults;
 };
