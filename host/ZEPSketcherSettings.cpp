@@ -5,7 +5,8 @@
 ZEP_IMPLEMENT_CLASS(ZEPCallbackManager, ZEPBaseUnknown)
 ZEP_IMPLEMENT_CLASS(ZEPSketcherSettings, ZEPCallbackManager)
 
-ZEPCallbackManager::CallbackId ZEPCallbackManager::AddCallback(const char* iEventName, Callback iCallback) {
+ZEPCallbackManager::CallbackId ZEPCallbackManager::AddCallback(const char* iEventName,
+                                                               Callback iCallback) {
   if (!iEventName || !iCallback) return 0;
   _subscriptions.push_back(Subscription{++_lastId, iEventName, std::move(iCallback)});
   return _lastId;
@@ -19,7 +20,8 @@ bool ZEPCallbackManager::RemoveCallback(CallbackId iId) {
   return true;
 }
 
-void ZEPCallbackManager::DispatchCallbacks(const char* iEventName, ZEPNotification* iNotif, void* iData) {
+void ZEPCallbackManager::DispatchCallbacks(const char* iEventName, ZEPNotification* iNotif,
+                                           void* iData) {
   if (!iEventName) return;
   // Work on the ids known now: callbacks may change the subscriptions while we run.
   std::vector<CallbackId> ids;
@@ -29,14 +31,26 @@ void ZEPCallbackManager::DispatchCallbacks(const char* iEventName, ZEPNotificati
     auto it = std::find_if(_subscriptions.begin(), _subscriptions.end(),
                            [id](const Subscription& s) { return s.id == id; });
     if (it == _subscriptions.end()) continue; // removed by an earlier callback
-    Callback callback = it->callback;       // a copy survives its own removal
+    Callback callback = it->callback;         // a copy survives its own removal
     callback(iEventName, iNotif, iData);
   }
 }
 
-const char* ZEPSketcherSettings::MultiModification() { return "ZEPSketcherSettings::MultiModification"; }
-const char* ZEPSketcherSettings::GridModification() { return "ZEPSketcherSettings::GridModification"; }
-const char* ZEPSketcherSettings::GeomUIModification() { return "ZEPSketcherSettings::GeomUIModification"; }
-const char* ZEPSketcherSettings::SnapModification() { return "ZEPSketcherSettings::SnapModification"; }
-const char* ZEPSketcherSettings::Visu3DUIModification() { return "ZEPSketcherSettings::Visu3DUIModification"; }
-const char* ZEPSketcherSettings::CpltModification() { return "ZEPSketcherSettings::CpltModification"; }
+const char* ZEPSketcherSettings::MultiModification() {
+  return "ZEPSketcherSettings::MultiModification";
+}
+const char* ZEPSketcherSettings::GridModification() {
+  return "ZEPSketcherSettings::GridModification";
+}
+const char* ZEPSketcherSettings::GeomUIModification() {
+  return "ZEPSketcherSettings::GeomUIModification";
+}
+const char* ZEPSketcherSettings::SnapModification() {
+  return "ZEPSketcherSettings::SnapModification";
+}
+const char* ZEPSketcherSettings::Visu3DUIModification() {
+  return "ZEPSketcherSettings::Visu3DUIModification";
+}
+const char* ZEPSketcherSettings::CpltModification() {
+  return "ZEPSketcherSettings::CpltModification";
+}

@@ -40,7 +40,8 @@ enum ZEP2DCstDiag : int {
 class ZEPCallbackManager : public ZEPBaseUnknown {
   ZEP_DECLARE_CLASS
 public:
-  using Callback = std::function<void(const char* iEventName, ZEPNotification* iNotif, void* iData)>;
+  using Callback =
+      std::function<void(const char* iEventName, ZEPNotification* iNotif, void* iData)>;
   using CallbackId = unsigned long;
 
   ZEPCallbackManager() = default;
@@ -118,9 +119,12 @@ public:
 
   virtual void GetColorDiagElts(ZEP2DCstDiag iDiag, unsigned int* iRed, unsigned int* iGreen,
                                 unsigned int* iBlue) = 0;
-  virtual void GetColorIsolatedElts(unsigned int* iRed, unsigned int* iGreen, unsigned int* iBlue) = 0;
-  virtual void GetColorProtectedElts(unsigned int* iRed, unsigned int* iGreen, unsigned int* iBlue) = 0;
-  virtual void GetColorConstructElts(unsigned int* iRed, unsigned int* iGreen, unsigned int* iBlue) = 0;
+  virtual void GetColorIsolatedElts(unsigned int* iRed, unsigned int* iGreen,
+                                    unsigned int* iBlue) = 0;
+  virtual void GetColorProtectedElts(unsigned int* iRed, unsigned int* iGreen,
+                                     unsigned int* iBlue) = 0;
+  virtual void GetColorConstructElts(unsigned int* iRed, unsigned int* iGreen,
+                                     unsigned int* iBlue) = 0;
   virtual void GetColorSmartPick(unsigned int* iRed, unsigned int* iGreen, unsigned int* iBlue) = 0;
 
   virtual int GetShowPosition() = 0;
@@ -149,12 +153,16 @@ public:
   virtual void SetDragMode(int iValue, int iNotify) = 0;
   virtual void SetDragElts(int iValue, int iNotify) = 0;
   virtual void SetDiagElts(int iValue, int iNotify) = 0;
-  virtual void SetColorDiagElts(ZEP2DCstDiag iDiag, unsigned int iRed, unsigned int iGreen, unsigned int iBlue,
-                                int iNotify) = 0;
-  virtual void SetColorIsolatedElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue, int iNotify) = 0;
-  virtual void SetColorProtectedElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue, int iNotify) = 0;
-  virtual void SetColorConstructElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue, int iNotify) = 0;
-  virtual void SetColorSmartPick(unsigned int iRed, unsigned int iGreen, unsigned int iBlue, int iNotify) = 0;
+  virtual void SetColorDiagElts(ZEP2DCstDiag iDiag, unsigned int iRed, unsigned int iGreen,
+                                unsigned int iBlue, int iNotify) = 0;
+  virtual void SetColorIsolatedElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue,
+                                    int iNotify) = 0;
+  virtual void SetColorProtectedElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue,
+                                     int iNotify) = 0;
+  virtual void SetColorConstructElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue,
+                                     int iNotify) = 0;
+  virtual void SetColorSmartPick(unsigned int iRed, unsigned int iGreen, unsigned int iBlue,
+                                 int iNotify) = 0;
   virtual void SetShowPosition(int iValue, int iNotify) = 0;
   virtual void SetShowPositionOnCursor(int iValue, int iNotify) = 0;
 

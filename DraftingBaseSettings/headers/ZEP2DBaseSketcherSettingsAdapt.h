@@ -71,10 +71,13 @@ public:
   int GetDragElts() override;
   int GetDiagElts() override;
 
-  void GetColorDiagElts(ZEP2DCstDiag iDiag, unsigned int* iRed, unsigned int* iGreen, unsigned int* iBlue) override;
+  void GetColorDiagElts(ZEP2DCstDiag iDiag, unsigned int* iRed, unsigned int* iGreen,
+                        unsigned int* iBlue) override;
   void GetColorIsolatedElts(unsigned int* iRed, unsigned int* iGreen, unsigned int* iBlue) override;
-  void GetColorProtectedElts(unsigned int* iRed, unsigned int* iGreen, unsigned int* iBlue) override;
-  void GetColorConstructElts(unsigned int* iRed, unsigned int* iGreen, unsigned int* iBlue) override;
+  void GetColorProtectedElts(unsigned int* iRed, unsigned int* iGreen,
+                             unsigned int* iBlue) override;
+  void GetColorConstructElts(unsigned int* iRed, unsigned int* iGreen,
+                             unsigned int* iBlue) override;
   void GetColorSmartPick(unsigned int* iRed, unsigned int* iGreen, unsigned int* iBlue) override;
 
   int GetShowPosition() override;
@@ -104,12 +107,16 @@ public:
   void SetDragMode(int iValue, int iNotify) override;
   void SetDragElts(int iValue, int iNotify) override;
   void SetDiagElts(int iValue, int iNotify) override;
-  void SetColorDiagElts(ZEP2DCstDiag iDiag, unsigned int iRed, unsigned int iGreen, unsigned int iBlue,
-                        int iNotify) override;
-  void SetColorIsolatedElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue, int iNotify) override;
-  void SetColorProtectedElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue, int iNotify) override;
-  void SetColorConstructElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue, int iNotify) override;
-  void SetColorSmartPick(unsigned int iRed, unsigned int iGreen, unsigned int iBlue, int iNotify) override;
+  void SetColorDiagElts(ZEP2DCstDiag iDiag, unsigned int iRed, unsigned int iGreen,
+                        unsigned int iBlue, int iNotify) override;
+  void SetColorIsolatedElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue,
+                            int iNotify) override;
+  void SetColorProtectedElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue,
+                             int iNotify) override;
+  void SetColorConstructElts(unsigned int iRed, unsigned int iGreen, unsigned int iBlue,
+                             int iNotify) override;
+  void SetColorSmartPick(unsigned int iRed, unsigned int iGreen, unsigned int iBlue,
+                         int iNotify) override;
   void SetShowPosition(int iValue, int iNotify) override;
   void SetShowPositionOnCursor(int iValue, int iNotify) override;
 
@@ -137,7 +144,9 @@ protected:
 
 private:
   // Packed 0xRRGGBB to components: written only when all three outputs are given.
-  static void GetRGB(unsigned int iPacked, unsigned int* iRed, unsigned int* iGreen, unsigned int* iBlue);
+  static void GetRGB(unsigned int iPacked, unsigned int* iRed, unsigned int* iGreen,
+                     unsigned int* iBlue);
   // Components to packed 0xRRGGBB, when the output is given.
-  static void SetRGB(unsigned int* iPacked, unsigned int iRed, unsigned int iGreen, unsigned int iBlue);
+  static void SetRGB(unsigned int* iPacked, unsigned int iRed, unsigned int iGreen,
+                     unsigned int iBlue);
 };
