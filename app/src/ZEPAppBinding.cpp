@@ -21,6 +21,15 @@ const ZEPAppSetting* FindSetting(const std::string& iPage, const std::string& iA
   return nullptr;
 }
 
+namespace {
+std::function<void(const ZEPAppSetting&)>& WriteObserver() {
+  static std::function<void(const ZEPAppSetting&)> observer;
+  return observer;
+}
+} // namespace
+
+void SetWriteObserver(std::function<void(const ZEPAppSetting&)> iObserver) { WriteObserver() = std::move(iObserver); }
+
 ZEPSysSettingRepository* ZEPAppBinding::Repository(const ZEPAppSetting& iSetting) const {
   return ZEPSysSettingRepository::GetRepository(iSetting.repository.c_str(), 0);
 }
@@ -68,7 +77,9 @@ template <class T> long ZEPAppBinding::Write(const char* iAttribute, const T* iV
     ZEPSysSettingRepository* rep = Repository(*setting);
     if (!rep) return E_FAIL;
     std::vector<S> buffer(iValues, iValues + iCount);
-    return rep->WriteAttr(setting->stored.c_str(), buffer.data(), iCount) == 1 ? S_OK : E_FAIL;
+    if (rep->WriteAttr(setting->stored.c_str(), buffer.data(), iCount) != 1) return E_FAIL;
+    if (WriteObserver()) WriteObserver()(*setting);
+    return S_OK;
   }
 }
 

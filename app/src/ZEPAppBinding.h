@@ -3,6 +3,7 @@
 
 #include "ZEPDrwSettingHooks.h"
 
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -30,6 +31,10 @@ struct ZEPAppSetting {
 };
 
 const std::vector<ZEPAppSetting>& AppSettings();
+
+// Called after each successful write of a page's setting (e.g. to tell the sketcher);
+// one observer, replaced by the next call; an empty function removes it.
+void SetWriteObserver(std::function<void(const ZEPAppSetting&)> iObserver);
 const ZEPAppSetting* FindSetting(const std::string& iPage, const std::string& iAttribute);
 
 class ZEPAppBinding {
