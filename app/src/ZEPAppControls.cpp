@@ -1,0 +1,442 @@
+#include "ZEPAppControls.h"
+
+#include "ZEP2DBaseRangeCmb.h"
+#include "ZEPDrwLockDialog.h"
+#include "ZEPDrwLockLabel.h"
+
+#include <algorithm>
+#include <cctype>
+#include <cmath>
+#include <cstdlib>
+
+namespace zepapp {
+
+namespace {
+
+std::string Lower(std::string s) {
+  for (char& c : s) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+  return s;
+}
+
+std::string Trim(const std::string& s) {
+  const auto first = s.find_first_not_of(" \t");
+  if (first == std::string::npos) return "";
+  return s.substr(first, s.find_last_not_of(" \t") - first + 1);
+}
+
+std::string Quoted(const std::string& s) { return "\"" + s + "\""; }
+
+// The combo the user picks lines in, as the driver sees it.
+ZEPDlgCombo* PickableCombo(ZEPDialog* iWidget) {
+  if (auto* combo = ZEPSysDynamicCast<ZEPDlgCombo>(iWidget)) return combo;
+  if (auto* numbered = ZEPSysDynamicCast<ZEPNumberedCombo>(iWidget)) return numbered->GetCombo();
+  if (auto* colour = ZEPSysDynamicCast<ZEPComboColor>(iWidget)) return colour->GetCombo();
+  return nullptr;
+}
+
+std::vector<std::string> Lines(const ZEPDlgCombo& iCombo) {
+  std::vector<std::string> lines;
+  for (int i = 0; i < iCombo.GetLineCount(); ++i) {
+    ZEPUnicodeString text;
+    iCombo.GetLine(text, i);
+    lines.push_back(text.str());
+  }
+  return lines;
+}
+
+// Toolkit units (the numbering of the settings services) and what the user may type for them.
+enum class Magnitude { None, Length, Angle };
+struct UnitWord {
+  const char* word;
+  ZEPDlgUnit unit;
+};
+const UnitWord kUnitWords[] = {
+    {"mm", 45},       {"millimetre", 45}, {"millimetres", 45}, {"millimeter", 45}, {"millimeters", 45},
+    {"cm", 46},       {"centimetre", 46}, {"centimetres", 46}, {"centimeter", 46}, {"centimeters", 46},
+    {"m", 43},        {"metre", 43},      {"metres", 43},      {"meter", 43},      {"meters", 43},
+    {"km", 47},       {"um", 44},         {"\xC2\xB5m", 44},   {"micron", 44},     {"microns", 44},
+    {"in", 48},       {"inch", 48},       {"inches", 48},      {"\"", 48},         {"ft", 49},
+    {"foot", 49},     {"feet", 49},       {"'", 49},           {"deg", 12},        {"degree", 12},
+    {"degrees", 12},  {"\xC2\xB0", 12},   {"rad", 11},         {"radian", 11},     {"radians", 11},
+    {"gr", 15},       {"grad", 15},       {"grade", 15},       {"grades", 15},     {"gon", 15},
+};
+// The short forms listed in messages.
+const char* const kLengthWords = "mm, cm, m, km, in, ft";
+const char* const kAngleWords = "deg, rad, gr";
+
+Magnitude MagnitudeOf(ZEPDlgUnit iUnit) {
+  if (iUnit >= 43 && iUnit <= 52) return Magnitude::Length;
+  if (iUnit == 11 || iUnit == 12 || iUnit == 15) return Magnitude::Angle;
+  return Magnitude::None;
+}
+
+bool IsWhole(double v) { return std::fabs(v - std::round(v)) < 1e-9; }
+
+// A count spinner (no unit) whose limits and step are whole numbers takes whole numbers only.
+bool TakesWholeNumbers(const ZEPDlgSpinner& s) {
+  if (MagnitudeOf(s.GetUnit()) != Magnitude::None) return false;
+  double lo = 0, hi = 0, step = 1;
+  s.GetMinMaxStep(lo, hi, step);
+  return !s.HasLimits() || (IsWhole(lo) && IsWhole(hi) && IsWhole(step));
+}
+
+// Length of the number at the start of s ("-2.5e3"); 0 when it does not start with one.
+std::size_t NumberLength(const std::string& s) {
+  std::size_t i = 0;
+  auto digits = [&] {
+    std::size_t from = i;
+    while (i < s.size() && std::isdigit(static_cast<unsigned char>(s[i]))) ++i;
+    return i - from;
+  };
+  if (i < s.size() && (s[i] == '+' || s[i] == '-')) ++i;
+  std::size_t mantissa = digits();
+  if (i < s.size() && s[i] == '.') {
+    ++i;
+    mantissa += digits();
+  }
+  if (mantissa == 0) return 0;
+  if (i < s.size() && (s[i] == 'e' || s[i] == 'E')) {
+    std::size_t mark = i++;
+    if (i < s.size() && (s[i] == '+' || s[i] == '-')) ++i;
+    if (digits() == 0) i = mark; // "2e" is 2 followed by something else
+  }
+  return i;
+}
+
+const ZEPAppControl* ByName(const std::vector<ZEPAppControl>& iControls, const std::string& iName) {
+  for (const ZEPAppControl& c : iControls)
+    if (c.name == iName) return &c;
+  return nullptr;
+}
+
+const ZEPAppControl* RangeControl(const std::vector<ZEPAppControl>& iControls) {
+  for (const ZEPAppControl& c : iControls)
+    if (dynamic_cast<ZEP2DBaseRangeCmb*>(c.widget)) return &c;
+  return nullptr;
+}
+
+// Controls that their page enables only while a check button is on.
+struct Dependency {
+  const char* control;
+  const char* needs;
+};
+const Dependency kDependencies[] = {
+    {"editorGridSpacingV", "checkAllowDistortions"},
+    {"editorGridGraduationV", "checkAllowDistortions"},
+};
+
+void Walk(ZEPDialog* iWidget, std::string iSection, std::vector<ZEPAppControl>& oControls) {
+  if (auto* section = ZEPSysDynamicCast<ZEPDlgToolsOptionsFrame>(iWidget)) iSection = section->GetTitle().str();
+  if (auto* lockAware = dynamic_cast<ZEPDrwLockDialog*>(iWidget)) {
+    if (ZEPDialog* inner = lockAware->GetDialog())
+      oControls.push_back({iWidget->GetOwnName(), iWidget, inner, lockAware, iSection});
+    return;
+  }
+  if (dynamic_cast<ZEPDrwLockLabel*>(iWidget)) return; // a caption
+  const bool operable = PickableCombo(iWidget) || ZEPSysDynamicCast<ZEPDlgSpinner>(iWidget) ||
+                        ZEPSysDynamicCast<ZEPDlgCheckButton>(iWidget);
+  if (operable) {
+    if (iWidget->GetVisibility() != ZEPDlgHide)
+      oControls.push_back({iWidget->GetOwnName(), iWidget, iWidget, nullptr, iSection});
+    return;
+  }
+  for (ZEPDialog* child : iWidget->GetChildren()) Walk(child, iSection, oControls);
+}
+
+} // namespace
+
+// ---- one control ------------------------------------------------------------------------------
+ZEPAppKind ZEPAppControl::Kind() const {
+  if (ZEPSysDynamicCast<ZEPDlgCheckButton>(inner)) return ZEPAppKind::Check;
+  if (ZEPSysDynamicCast<ZEPDlgSpinner>(inner)) return ZEPAppKind::Spinner;
+  if (PickableCombo(inner)) return ZEPAppKind::Combo;
+  return ZEPAppKind::Other;
+}
+
+std::string ZEPAppControl::Title() const {
+  if (!inner->GetTitle().IsEmpty()) return inner->GetTitle().str();
+  if (!widget->GetTitle().IsEmpty()) return widget->GetTitle().str();
+  return name;
+}
+
+std::string ZEPAppControl::Shown() const {
+  switch (Kind()) {
+  case ZEPAppKind::Check:
+    return ZEPSysDynamicCast<ZEPDlgCheckButton>(inner)->GetState() == ZEPDlgChecked ? "on" : "off";
+  case ZEPAppKind::Spinner: {
+    const auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(inner);
+    return spinner->FormatValue(spinner->GetValue());
+  }
+  case ZEPAppKind::Combo: {
+    const ZEPDlgCombo* combo = PickableCombo(inner);
+    ZEPUnicodeString text;
+    if (combo->GetLine(text, combo->GetSelect()) < 0) return "(none)";
+    return text.str();
+  }
+  case ZEPAppKind::Other:
+    break;
+  }
+  return "";
+}
+
+bool ZEPAppControl::Locked() const { return lockAware && lockAware->GetLock() && lockAware->GetLock()->IsLocked(); }
+
+std::string ZEPAppControl::LockText() const {
+  if (!Locked()) return "";
+  const std::string& text = lockAware->GetLock()->GetLockText();
+  return text.empty() ? "Locked by an administrator" : text;
+}
+
+bool ZEPAppControl::Disabled() const { return !inner->IsEffectivelyEnabled(); }
+
+std::string ZEPAppControl::Accepts() const {
+  switch (Kind()) {
+  case ZEPAppKind::Check:
+    return "on or off";
+  case ZEPAppKind::Spinner: {
+    const auto* s = ZEPSysDynamicCast<ZEPDlgSpinner>(inner);
+    double lo = 0, hi = 0, step = 0;
+    s->GetMinMaxStep(lo, hi, step);
+    const Magnitude m = MagnitudeOf(s->GetUnit());
+    if (m == Magnitude::None) {
+      const std::string what = TakesWholeNumbers(*s) ? "a whole number" : "a number";
+      return s->HasLimits() ? what + " from " + s->FormatValue(lo) + " to " + s->FormatValue(hi) : what;
+    }
+    std::string text = m == Magnitude::Length ? "a length" : "an angle";
+    if (s->HasLimits()) text += " from " + s->FormatValue(lo) + " to " + s->FormatValue(hi);
+    text += ", in " + s->UnitSymbol() + " or with a unit (" + (m == Magnitude::Length ? kLengthWords : kAngleWords) +
+            ")";
+    return text;
+  }
+  case ZEPAppKind::Combo: {
+    const std::vector<std::string> lines = Lines(*PickableCombo(inner));
+    std::string text = "a line number from 1 to " + std::to_string(lines.size()) + " or the text of a line:";
+    for (std::size_t i = 0; i < lines.size(); ++i) text += "\n  " + std::to_string(i + 1) + "  " + lines[i];
+    return text;
+  }
+  case ZEPAppKind::Other:
+    break;
+  }
+  return "nothing: it cannot be set from the command line";
+}
+
+// ---- a page's controls --------------------------------------------------------------------------
+std::vector<ZEPAppControl> PageControls(ZEPDialog* iPage) {
+  std::vector<ZEPAppControl> controls;
+  if (iPage)
+    for (ZEPDialog* child : iPage->GetChildren()) Walk(child, "", controls);
+  return controls;
+}
+
+const ZEPAppControl* FindPageControl(const std::vector<ZEPAppControl>& iControls, const std::string& iName) {
+  if (const ZEPAppControl* exact = ByName(iControls, iName)) return exact;
+  const ZEPAppControl* found = nullptr;
+  for (const ZEPAppControl& c : iControls)
+    if (Lower(c.name) == Lower(iName)) {
+      if (found) return nullptr; // ambiguous
+      found = &c;
+    }
+  return found;
+}
+
+int ShownRange(const std::vector<ZEPAppControl>& iControls) {
+  const ZEPAppControl* range = RangeControl(iControls);
+  if (!range) return 0;
+  const int r = static_cast<ZEP2DBaseRangeCmb*>(range->widget)->GetSelect();
+  return r >= 1 && r <= 5 ? r : 0;
+}
+
+std::string WhyRefused(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl) {
+  const std::string title = Quoted(iControl.Title());
+  if (iControl.Locked()) return title + " is locked: " + iControl.LockText();
+  const std::string why = ZEPDlgDriver::WhyNotOperable(iControl.inner);
+  if (why.empty()) return "";
+  if (why.rfind("locked", 0) == 0) return title + " is " + why; // a lock further up the tree
+  if (why == "hidden") return title + " is hidden on this page";
+  for (const Dependency& d : kDependencies) {
+    const ZEPAppControl* needed = d.control == iControl.name ? ByName(iControls, d.needs) : nullptr;
+    if (!needed || needed->Shown() != "off") continue;
+    std::string text = title + " is disabled while " + Quoted(needed->Title()) + " is off";
+    if (int range = ShownRange(iControls)) {
+      ZEPICkeScalesServices_var scales = ZEPGlobalFunctions2::GetScalesServices();
+      if (scales) text += " for the " + scales->GetScaleName(static_cast<ZEPCkeScale>(range)).str() + " scale range";
+    }
+    return text + "; turn " + Quoted(needed->Title()) + " (" + needed->name + ") on first";
+  }
+  return title + " is disabled on this page";
+}
+
+// ---- values -----------------------------------------------------------------------------------
+bool ParseSpinnerValue(const ZEPDlgSpinner& iSpinner, const std::string& iText, double& oInternal,
+                       std::string& oError) {
+  const std::string text = Trim(iText);
+  const std::size_t length = NumberLength(text);
+  if (length == 0) {
+    oError = Quoted(iText) + " is not a number";
+    return false;
+  }
+  const double number = std::strtod(text.substr(0, length).c_str(), nullptr);
+  const std::string word = Trim(text.substr(length));
+  const Magnitude own = MagnitudeOf(iSpinner.GetUnit());
+  if (!std::isfinite(number)) {
+    oError = Quoted(iText) + " is too large";
+    return false;
+  }
+  if (word.empty()) {
+    oInternal = iSpinner.FromDisplay(number);
+  } else {
+    const UnitWord* unit = nullptr;
+    for (const UnitWord& u : kUnitWords)
+      if (Lower(word) == u.word) unit = &u;
+    if (own == Magnitude::None) {
+      oError = Quoted(word) + ": this control takes a plain number, without a unit";
+      return false;
+    }
+    if (!unit || MagnitudeOf(unit->unit) != own) {
+      oError = Quoted(word) + " is not " + (own == Magnitude::Length ? "a length unit (" : "an angle unit (") +
+               (own == Magnitude::Length ? kLengthWords : kAngleWords) + ")";
+      return false;
+    }
+    ZEPDlgSpinner probe(nullptr, "unitProbe", ZEPDlgSpnDouble);
+    probe.SetUnit(unit->unit);
+    oInternal = probe.FromDisplay(number);
+  }
+  if (!std::isfinite(oInternal)) {
+    oError = Quoted(iText) + " is too large";
+    return false;
+  }
+  if (TakesWholeNumbers(iSpinner) && !IsWhole(oInternal)) {
+    oError = Quoted(iText) + " is not a whole number";
+    return false;
+  }
+  return true;
+}
+
+namespace {
+
+ZEPAppOutcome Done(const ZEPAppControl& iControl, bool iChanged) {
+  ZEPAppOutcome out;
+  out.changed = iChanged;
+  out.message = iControl.Title() + ": " + iControl.Shown();
+  if (!iChanged) out.message += " (unchanged)";
+  return out;
+}
+
+ZEPAppOutcome Fail(int iCode, std::string iMessage) {
+  ZEPAppOutcome out;
+  out.code = iCode;
+  out.message = std::move(iMessage);
+  return out;
+}
+
+ZEPAppOutcome BadValue(const ZEPAppControl& iControl, const std::string& iWhy) {
+  return Fail(kExitBadValue, iWhy + "; " + Quoted(iControl.Title()) + " (" + iControl.name + ") takes " +
+                                 iControl.Accepts());
+}
+
+ZEPAppOutcome Refused(const ZEPAppControl& iControl) {
+  return Fail(kExitRefused, Quoted(iControl.Title()) + " did not accept the change");
+}
+
+// The line the user means: its number from 1, else its text, its start, or its word in
+// parentheses ("mm" for "Millimetre (mm)"), ignoring case. -1 when none or several fit.
+int FindLine(const std::vector<std::string>& iLines, const std::string& iText) {
+  const std::string wanted = Lower(Trim(iText));
+  if (wanted.empty()) return -1;
+  if (std::all_of(wanted.begin(), wanted.end(), [](char c) { return std::isdigit(static_cast<unsigned char>(c)); })) {
+    if (wanted.size() > 6) return -1;
+    const int n = std::atoi(wanted.c_str());
+    return n >= 1 && n <= static_cast<int>(iLines.size()) ? n - 1 : -1;
+  }
+  using Test = bool (*)(const std::string& line, const std::string& wanted);
+  const Test tests[] = {
+      [](const std::string& l, const std::string& w) { return l == w; },
+      [](const std::string& l, const std::string& w) { return l.rfind(w, 0) == 0; },
+      [](const std::string& l, const std::string& w) { return l.find("(" + w + ")") != std::string::npos; },
+  };
+  for (Test test : tests) {
+    int found = -1, count = 0;
+    for (std::size_t i = 0; i < iLines.size(); ++i)
+      if (test(Lower(iLines[i]), wanted)) {
+        found = static_cast<int>(i);
+        ++count;
+      }
+    if (count == 1) return found;
+    if (count > 1) return -1;
+  }
+  return -1;
+}
+
+} // namespace
+
+ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl,
+                             const std::string& iText) {
+  const std::string why = WhyRefused(iControls, iControl);
+  if (!why.empty()) return Fail(kExitRefused, why);
+  switch (iControl.Kind()) {
+  case ZEPAppKind::Check: {
+    const std::string word = Lower(Trim(iText));
+    bool on = false;
+    if (word == "on" || word == "yes" || word == "true" || word == "1") on = true;
+    else if (word == "off" || word == "no" || word == "false" || word == "0") on = false;
+    else return BadValue(iControl, Quoted(iText) + " is neither on nor off");
+    const bool isOn = ZEPSysDynamicCast<ZEPDlgCheckButton>(iControl.inner)->GetState() == ZEPDlgChecked;
+    if (isOn == on) return Done(iControl, false);
+    if (!ZEPDlgDriver::Click(iControl.inner)) return Refused(iControl);
+    return Done(iControl, true);
+  }
+  case ZEPAppKind::Spinner: {
+    const auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(iControl.inner);
+    double value = 0;
+    std::string error;
+    if (!ParseSpinnerValue(*spinner, iText, value, error)) return BadValue(iControl, error);
+    if (spinner->HasLimits()) {
+      double lo = 0, hi = 0, step = 0;
+      spinner->GetMinMaxStep(lo, hi, step);
+      // Typed values come through a unit conversion: allow its rounding, the driver clamps it.
+      const double slack = 1e-9 * std::max({1.0, std::fabs(lo), std::fabs(hi)});
+      if (value < lo - slack || value > hi + slack)
+        return BadValue(iControl, spinner->FormatValue(value) + " is outside the limits");
+    }
+    if (!ZEPDlgDriver::Enter(iControl.inner, value)) return Refused(iControl);
+    return Done(iControl, true);
+  }
+  case ZEPAppKind::Combo: {
+    const ZEPDlgCombo* combo = PickableCombo(iControl.inner);
+    const int line = FindLine(Lines(*combo), iText);
+    if (line < 0) return BadValue(iControl, Quoted(iText) + " is not one of its lines");
+    if (line == combo->GetSelect()) return Done(iControl, false);
+    if (!ZEPDlgDriver::Select(iControl.inner, line)) return Refused(iControl);
+    return Done(iControl, true);
+  }
+  case ZEPAppKind::Other:
+    break;
+  }
+  return Fail(kExitUsage, Quoted(iControl.Title()) + " cannot be set from the command line");
+}
+
+ZEPAppOutcome SelectRange(const std::vector<ZEPAppControl>& iControls, int iRange) {
+  const ZEPAppControl* range = RangeControl(iControls);
+  if (!range) return Fail(kExitUsage, "this page has no scale range");
+  if (ShownRange(iControls) == iRange) return Done(*range, false);
+  ZEPICkeScalesServices_var scales = ZEPGlobalFunctions2::GetScalesServices();
+  const std::string name =
+      scales && iRange >= 1 && iRange <= 5 ? scales->GetScaleName(static_cast<ZEPCkeScale>(iRange)).str() : "";
+  const std::vector<std::string> lines = Lines(*static_cast<ZEPDlgCombo*>(range->widget));
+  const auto it = name.empty() ? lines.end() : std::find(lines.begin(), lines.end(), name);
+  if (it == lines.end())
+    return BadValue(*range, "scale range " + std::to_string(iRange) + " is not activated");
+  const std::string why = WhyRefused(iControls, *range);
+  if (!why.empty()) return Fail(kExitRefused, why);
+  if (!ZEPDlgDriver::Select(range->inner, static_cast<int>(it - lines.begin()))) return Refused(*range);
+  return Done(*range, true);
+}
+
+std::size_t TextWidth(const std::string& iText) {
+  std::size_t n = 0;
+  for (unsigned char c : iText)
+    if ((c & 0xC0) != 0x80) ++n;
+  return n;
+}
+
+} // namespace zepapp

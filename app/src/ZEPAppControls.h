@@ -1,0 +1,82 @@
+// The controls of an opened page as the user sees them: what each shows, whether it can be
+// operated and why not, and how a value typed on the command line becomes a user action.
+#pragma once
+
+#include "ZEPHost.h"
+
+#include <string>
+#include <vector>
+
+class ZEPDrwLockDialog;
+
+namespace zepapp {
+
+// Exit codes of the application, also the outcome of an operation.
+enum ZEPAppExit : int {
+  kExitOk = 0,
+  kExitFailure = 1,  // something unexpected
+  kExitUsage = 2,    // bad command line, unknown page, control or attribute
+  kExitRefused = 3,  // locked or disabled control: nothing written
+  kExitBadValue = 4, // a value the control does not accept: nothing written
+  kExitFile = 5,     // a settings file that cannot be read or written
+};
+
+enum class ZEPAppKind { Check, Spinner, Combo, Other };
+
+// One control of a page: a lock-aware control, or an operable control without padlock
+// (the grid page's scale range combo).
+struct ZEPAppControl {
+  std::string name;                     // "editorGridSpacing"
+  ZEPDialog* widget = nullptr;          // the widget of that name
+  ZEPDialog* inner = nullptr;           // what the user operates
+  ZEPDrwLockDialog* lockAware = nullptr; // null without padlock
+  std::string section;                  // title of its section
+
+  ZEPAppKind Kind() const;
+  std::string Title() const;
+  // The value as the control shows it: "on"/"off", "100 mm", the selected line.
+  std::string Shown() const;
+  // Its padlock is closed.
+  bool Locked() const;
+  // Who locked it and where; empty when not locked.
+  std::string LockText() const;
+  // The user cannot operate it, locked or not.
+  bool Disabled() const;
+  // What a value for this control may be, for error messages.
+  std::string Accepts() const;
+};
+
+// Every control of a page, in tree order.
+std::vector<ZEPAppControl> PageControls(ZEPDialog* iPage);
+// By name; an exact match first, else the only case-insensitive one. Null if none.
+const ZEPAppControl* FindPageControl(const std::vector<ZEPAppControl>& iControls, const std::string& iName);
+
+// Why the user cannot operate the control, as a sentence naming who locked it and where, or
+// what keeps it disabled; empty when it can be operated.
+std::string WhyRefused(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl);
+
+struct ZEPAppOutcome {
+  int code = kExitOk;
+  std::string message; // what happened, or why not
+  bool changed = false; // the user action was performed
+};
+
+// Operates the control with iText as a user would (click, enter, select), or refuses.
+ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl,
+                             const std::string& iText);
+
+// A spinner value typed by the user: a number with an optional unit ("25mm", "2.5 cm", "1in",
+// "15deg"), in the internal unit of the spinner (metres, radians, plain numbers). False with
+// oError when the text or its unit does not fit the spinner.
+bool ParseSpinnerValue(const ZEPDlgSpinner& iSpinner, const std::string& iText, double& oInternal,
+                       std::string& oError);
+
+// The scale range the grid page's range combo shows, 1 to 5; 0 when there is none.
+int ShownRange(const std::vector<ZEPAppControl>& iControls);
+// Selects range iRange (1 to 5) in the range combo through the driver.
+ZEPAppOutcome SelectRange(const std::vector<ZEPAppControl>& iControls, int iRange);
+
+// Code points of UTF-8 text, for aligned columns.
+std::size_t TextWidth(const std::string& iText);
+
+} // namespace zepapp

@@ -1,0 +1,260 @@
+#include "ZEPAppRender.h"
+
+#include <sstream>
+
+namespace zepapp {
+
+std::string EscapeHtml(const std::string& iText) {
+  std::string out;
+  out.reserve(iText.size());
+  for (char c : iText) {
+    switch (c) {
+    case '&': out += "&amp;"; break;
+    case '<': out += "&lt;"; break;
+    case '>': out += "&gt;"; break;
+    case '"': out += "&quot;"; break;
+    case '\'': out += "&#39;"; break;
+    default: out += c;
+    }
+  }
+  return out;
+}
+
+namespace {
+
+const char* const kClosedLock = "\xF0\x9F\x94\x92"; // U+1F512
+const char* const kOpenLock = "\xF0\x9F\x94\x93";   // U+1F513
+
+// Padlocks are drawn rather than left to an emoji font the reader may lack; the emoji stays
+// in the text for copying and searching.
+std::string Padlock(bool iLocked) {
+  const char* shackle = iLocked ? "M4.5 7.5V5a3.5 3.5 0 0 1 7 0v2.5" : "M11 7.5V3.8a3 3 0 0 0-6 0v.9";
+  return std::string("<svg viewBox=\"0 0 16 16\" width=\"14\" height=\"14\" aria-hidden=\"true\"><path d=\"") +
+         shackle + "\" fill=\"none\" stroke=\"currentColor\" stroke-width=\"1.7\"/><rect x=\"2.5\" y=\"7\" " +
+         "width=\"11\" height=\"8\" rx=\"1.6\" fill=\"currentColor\"/></svg><span class=\"sr\">" +
+         (iLocked ? kClosedLock : kOpenLock) + "</span>";
+}
+
+const char* const kStyle = R"CSS(
+*{box-sizing:border-box}
+body{margin:0;padding:28px;background:#5b6e86;font:13px/1.35 "Segoe UI",Tahoma,"DejaVu Sans",Arial,sans-serif;color:#1b1b1b}
+.dialog{max-width:980px;margin:0 auto;background:#eceef1;border:1px solid #2f3b4c;border-radius:6px;box-shadow:0 10px 30px rgba(0,0,0,.35);overflow:hidden}
+.titlebar{display:flex;align-items:center;gap:8px;padding:7px 12px;background:linear-gradient(#3f6fb0,#2d548c);color:#fff;font-weight:600}
+.titlebar .icon{display:inline-block;width:16px;height:16px;border-radius:3px;background:#f4c542;box-shadow:inset 0 0 0 2px #d39e12}
+.titlebar .close{margin-left:auto;width:20px;height:18px;border-radius:3px;background:#c9443a;text-align:center;line-height:17px;font-size:12px}
+.body{padding:12px 14px 4px}
+.tabs{display:flex;gap:2px;padding-left:6px;position:relative;top:1px}
+.tabs label{padding:5px 14px;border:1px solid #9aa3ae;border-bottom:none;border-radius:5px 5px 0 0;background:#d8dce2;color:#333;cursor:pointer}
+.tabs label:hover{background:#e4e7eb}
+input.tab{position:absolute;opacity:0;pointer-events:none}
+.panels{border:1px solid #9aa3ae;background:#f7f8f9;border-radius:0 4px 4px 4px;padding:12px 16px 16px;min-height:260px}
+.page{display:none}
+.page h2{margin:0 0 2px;font-size:15px;font-weight:600;color:#203656}
+.page .note{margin:0 0 8px;color:#56606c;font-size:12px}
+.grid{display:grid;align-items:center;justify-items:start;justify-content:start;gap:5px 14px}
+.pagegrid{display:grid;gap:10px;justify-items:stretch;align-items:start;margin-top:8px}
+.lockable{display:grid;grid-template-columns:20px auto;align-items:center;gap:0 4px}
+fieldset.section{margin:0;padding:6px 12px 10px;border:1px solid #b8bfc8;border-radius:4px;background:#fff}
+fieldset.section legend{padding:0 6px;font-weight:600;color:#203656}
+.padlock{display:inline-flex;align-items:center;justify-content:center;width:20px;height:18px;cursor:help}
+.padlock.open{color:#a9b1bb}
+.padlock.locked{color:#b7791f}
+.sr{position:absolute;width:1px;height:1px;overflow:hidden;clip:rect(0 0 0 0);white-space:nowrap}
+.spacer{display:inline-block;width:20px}
+.check,.radio{display:inline-flex;align-items:center;gap:6px;white-space:nowrap}
+.check .box{width:14px;height:14px;border:1px solid #7a8390;border-radius:2px;background:#fff;display:inline-flex;align-items:center;justify-content:center;font-size:11px;line-height:1;color:#1d5fb4;font-weight:700}
+.radio .box{width:14px;height:14px;border:1px solid #7a8390;border-radius:50%;background:#fff;display:inline-flex;align-items:center;justify-content:center}
+.radio.on .box::after{content:"";width:6px;height:6px;border-radius:50%;background:#1d5fb4}
+.spinner,.combo,.editor{display:inline-flex;align-items:stretch;border:1px solid #8f98a4;border-radius:3px;background:#fff;min-height:22px}
+.spinner .value{min-width:84px;padding:2px 6px;text-align:right;font-variant-numeric:tabular-nums}
+.spinner .arrows{display:flex;flex-direction:column;border-left:1px solid #c3c9d0;background:#eef0f3;width:15px;font-size:7px;line-height:10px;text-align:center;color:#444}
+.combo .value{min-width:120px;padding:2px 6px}
+.combo .drop{border-left:1px solid #c3c9d0;background:#eef0f3;width:18px;text-align:center;font-size:9px;line-height:20px;color:#444}
+.editor .value{min-width:120px;padding:2px 6px}
+.push{display:inline-block;padding:3px 14px;border:1px solid #7a8390;border-radius:3px;background:linear-gradient(#fdfdfd,#e3e6ea)}
+.label{white-space:nowrap}
+.disabled,.disabled .value{color:#9097a0}
+.disabled .box,.spinner.disabled,.combo.disabled,.editor.disabled{background:#eef0f2;border-color:#c3c8cf}
+.spinner.disabled .arrows,.combo.disabled .drop{color:#b0b5bb}
+.hidden{visibility:hidden}
+.footer{display:flex;flex-wrap:wrap;gap:4px 18px;padding:8px 14px 10px;color:#4b5561;font-size:12px}
+.footer code{font-family:"DejaVu Sans Mono",Consolas,monospace;font-size:11px;background:#e0e4e9;padding:0 4px;border-radius:3px}
+.buttons{display:flex;justify-content:flex-end;gap:8px;padding:0 14px 12px}
+.buttons span{min-width:74px;text-align:center}
+@media print{.page{display:block;margin-bottom:18px}.tabs{display:none}body{background:#fff}}
+)CSS";
+
+std::string CellStyle(const ZEPDialog& w) {
+  const ZEPDialog::Cell& c = w.GetGridConstraints();
+  if (!c.set) return "";
+  const int width = c.width > 0 ? c.width : 1;
+  const int height = c.height > 0 ? c.height : 1;
+  std::ostringstream s;
+  s << "grid-row:" << c.row + 1 << " / span " << height << ";grid-column:" << c.column + 1 << " / span " << width;
+  return s.str();
+}
+
+// Class, name, tooltip and cell of an element.
+std::string Attributes(const ZEPDialog& w, std::string iClass, const std::string& iTooltip) {
+  const bool hidden = w.GetVisibility() == ZEPDlgHide;
+  if (hidden) iClass += " hidden";
+  else if (!w.IsEffectivelyEnabled() && !ZEPSysDynamicCast<ZEPDlgLock>(const_cast<ZEPDialog*>(&w)))
+    iClass += " disabled";
+  std::string out = " class=\"" + iClass + "\" data-name=\"" + EscapeHtml(w.GetOwnName()) + "\"";
+  if (!iTooltip.empty()) out += " title=\"" + EscapeHtml(iTooltip) + "\"";
+  const std::string style = CellStyle(w);
+  if (!style.empty()) out += " style=\"" + style + "\"";
+  return out;
+}
+
+std::string Tooltip(const ZEPDialog& w) {
+  return !w.GetLongHelp().IsEmpty() ? w.GetLongHelp().str() : w.GetShortHelp().str();
+}
+
+void Render(const ZEPDialog& w, std::string& out);
+
+void Children(const ZEPDialog& w, std::string& out) {
+  for (const ZEPDialog* child : w.GetChildren()) Render(*child, out);
+}
+
+void RenderCombo(const ZEPDialog& w, const ZEPDlgCombo& combo, std::string& out) {
+  std::string lines, selected;
+  for (int i = 0; i < combo.GetLineCount(); ++i) {
+    ZEPUnicodeString text;
+    combo.GetLine(text, i);
+    lines += (i ? "\n" : "") + std::string(i == combo.GetSelect() ? "\xE2\x97\x8F " : "\xE2\x97\x8B ") + text.str();
+    if (i == combo.GetSelect()) selected = text.str();
+  }
+  std::string tip = w.GetTitle().str();
+  if (!Tooltip(w).empty()) tip += (tip.empty() ? "" : ": ") + Tooltip(w);
+  tip += (tip.empty() ? "" : "\n") + lines;
+  out += "<span" + Attributes(w, "combo", tip) + "><span class=\"value\">" + EscapeHtml(selected) +
+         "</span><span class=\"drop\">&#9660;</span></span>";
+}
+
+void Render(const ZEPDialog& w, std::string& out) {
+  auto* self = const_cast<ZEPDialog*>(&w);
+  if (auto* lock = ZEPSysDynamicCast<ZEPDlgLock>(self)) {
+    const bool locked = lock->IsLocked();
+    std::string tip = locked ? (lock->GetLockText().empty() ? "Locked by an administrator" : lock->GetLockText())
+                             : "Not locked: this setting can be changed";
+    out += "<span" + Attributes(w, locked ? "padlock locked" : "padlock open", tip) + " aria-label=\"" +
+           (locked ? "locked" : "not locked") + "\">" + Padlock(locked) + "</span>";
+    return;
+  }
+  if (auto* section = ZEPSysDynamicCast<ZEPDlgToolsOptionsFrame>(self)) {
+    out += "<fieldset" + Attributes(w, "section", "") + "><legend>" + EscapeHtml(section->GetTitle().str()) +
+           "</legend>";
+    for (const ZEPDialog* child : w.GetChildren()) {
+      out += "<div class=\"grid\">";
+      Children(*child, out); // the options frame's controls
+      out += "</div>";
+    }
+    out += "</fieldset>";
+    return;
+  }
+  if (auto* check = ZEPSysDynamicCast<ZEPDlgCheckButton>(self)) {
+    if (w.GetVisibility() == ZEPDlgHide) { // a padlock-sized placeholder
+      out += "<span" + Attributes(w, "spacer", "") + "></span>";
+      return;
+    }
+    const bool on = check->GetState() == ZEPDlgChecked;
+    out += "<span" + Attributes(w, on ? "check on" : "check", Tooltip(w)) + "><span class=\"box\">" +
+           (on ? "&#10003;" : "") + "</span><span class=\"text\">" + EscapeHtml(w.GetTitle().str()) +
+           "</span></span>";
+    return;
+  }
+  if (auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(self)) {
+    const bool on = radio->GetState() == ZEPDlgChecked;
+    out += "<span" + Attributes(w, on ? "radio on" : "radio", Tooltip(w)) +
+           "><span class=\"box\"></span><span class=\"text\">" + EscapeHtml(w.GetTitle().str()) + "</span></span>";
+    return;
+  }
+  if (auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(self)) {
+    std::string tip = w.GetTitle().str();
+    if (!Tooltip(w).empty()) tip += (tip.empty() ? "" : ": ") + Tooltip(w);
+    out += "<span" + Attributes(w, "spinner", tip) + "><span class=\"value\">" +
+           EscapeHtml(spinner->FormatValue(spinner->GetValue())) +
+           "</span><span class=\"arrows\"><span>&#9650;</span><span>&#9660;</span></span></span>";
+    return;
+  }
+  if (auto* combo = ZEPSysDynamicCast<ZEPDlgCombo>(self)) {
+    RenderCombo(w, *combo, out);
+    return;
+  }
+  if (auto* editor = ZEPSysDynamicCast<ZEPDlgEditor>(self)) {
+    out += "<span" + Attributes(w, "editor", Tooltip(w)) + "><span class=\"value\">" +
+           EscapeHtml(editor->GetText().str()) + "</span></span>";
+    return;
+  }
+  if (ZEPSysDynamicCast<ZEPDlgPushButton>(self)) {
+    out += "<span" + Attributes(w, "push", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) + "</span>";
+    return;
+  }
+  if (ZEPSysDynamicCast<ZEPDlgLabel>(self)) {
+    out += "<span" + Attributes(w, "label", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) + "</span>";
+    return;
+  }
+  // A frame: its own grid. Lock-aware controls keep the padlock column narrow.
+  bool hasLock = false;
+  for (const ZEPDialog* child : w.GetChildren())
+    hasLock = hasLock || ZEPSysDynamicCast<ZEPDlgLock>(const_cast<ZEPDialog*>(child)) ||
+              (ZEPSysDynamicCast<ZEPDlgCheckButton>(const_cast<ZEPDialog*>(child)) &&
+               child->GetVisibility() == ZEPDlgHide);
+  out += "<div" + Attributes(w, hasLock ? "lockable" : "grid", "") + ">";
+  Children(w, out);
+  out += "</div>";
+}
+
+} // namespace
+
+std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages, const ZEPAppRenderContext& iContext) {
+  std::string out;
+  out += "<!DOCTYPE html>\n<html lang=\"en\">\n<head>\n<meta charset=\"utf-8\">\n";
+  out += "<meta name=\"generator\" content=\"" + EscapeHtml(iContext.generator) + "\">\n";
+  out += "<title>Drafting options</title>\n<style>" + std::string(kStyle);
+  // Each tab shows its page while its radio button is checked.
+  for (const ZEPAppRenderPage& p : iPages) {
+    const std::string id = EscapeHtml(p.name);
+    out += "#tab-" + id + ":checked~.panels #page-" + id + "{display:block}\n";
+    out += "#tab-" + id + ":checked~.tabs label[for=tab-" + id +
+           "]{background:#f7f8f9;color:#000;font-weight:600;padding-bottom:6px}\n";
+  }
+  out += "</style>\n</head>\n<body>\n<div class=\"dialog\" role=\"dialog\" aria-label=\"Options\">\n";
+  out += "<div class=\"titlebar\"><span class=\"icon\"></span>Options &#8211; Drafting<span class=\"close\">"
+         "&#10005;</span></div>\n<div class=\"body\">\n";
+  bool first = true;
+  for (const ZEPAppRenderPage& p : iPages) {
+    out += "<input class=\"tab\" type=\"radio\" name=\"page\" id=\"tab-" + EscapeHtml(p.name) + "\"" +
+           (first ? " checked" : "") + ">\n";
+    first = false;
+  }
+  out += "<div class=\"tabs\" role=\"tablist\">";
+  for (const ZEPAppRenderPage& p : iPages)
+    out += "<label for=\"tab-" + EscapeHtml(p.name) + "\" role=\"tab\">" + EscapeHtml(p.title) + "</label>";
+  out += "</div>\n<div class=\"panels\">\n";
+  for (const ZEPAppRenderPage& p : iPages) {
+    out += "<section class=\"page\" id=\"page-" + EscapeHtml(p.name) + "\" role=\"tabpanel\">\n<h2>" +
+           EscapeHtml(p.title) + "</h2>\n";
+    if (!p.note.empty()) out += "<p class=\"note\">" + EscapeHtml(p.note) + "</p>\n";
+    if (p.frame) {
+      out += "<div class=\"pagegrid\">";
+      Children(*p.frame, out);
+      out += "</div>\n";
+    }
+    out += "</section>\n";
+  }
+  out += "</div>\n</div>\n<div class=\"footer\">";
+  out += "<span>Settings: <code>" +
+         EscapeHtml(iContext.settingsPath.empty() ? "none (not saved)" : iContext.settingsPath) + "</code></span>";
+  out += "<span>Administrator&#39;s settings: <code>" +
+         EscapeHtml(iContext.adminPath.empty() ? "none" : iContext.adminPath) + "</code></span>";
+  out += "<span><span class=\"padlock locked\">" + Padlock(true) +
+         "</span>locked (hover for who and where) &#183; <span class=\"padlock open\">" + Padlock(false) +
+         "</span>not locked &#183; greyed: not available</span>";
+  out += "</div>\n<div class=\"buttons\"><span class=\"push\">OK</span><span class=\"push\">Cancel</span></div>\n";
+  out += "</div>\n</body>\n</html>\n";
+  return out;
+}
+
+} // namespace zepapp

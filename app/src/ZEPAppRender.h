@@ -1,0 +1,31 @@
+// The pages drawn as one self-contained HTML file that looks like the options dialog: a tab
+// per page, each page laid out on the grid cells of its widgets, padlocks with their tooltips.
+#pragma once
+
+#include "ZEPHost.h"
+
+#include <string>
+#include <vector>
+
+namespace zepapp {
+
+struct ZEPAppRenderPage {
+  std::string name;           // "grid": anchors and tab ids
+  std::string title;          // "Grid"
+  const ZEPDialog* frame = nullptr; // the opened page
+  std::string note;           // a line under the page heading; may be empty
+};
+
+struct ZEPAppRenderContext {
+  std::string settingsPath; // shown in the footer; empty: none
+  std::string adminPath;
+  std::string generator;    // "drafting-options 0.1.0"
+};
+
+// The whole document. The first page is the tab shown first; no script, no external resource.
+std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages, const ZEPAppRenderContext& iContext);
+
+// Text made safe for HTML content and attribute values.
+std::string EscapeHtml(const std::string& iText);
+
+} // namespace zepapp
