@@ -4,6 +4,7 @@
 #include "ZEPAppPages.h"
 #include "ZEPAppRender.h"
 #include "ZEPAppSettingsFile.h"
+#include "ZEPAppSketcher.h"
 
 #include <CLI/CLI.hpp>
 
@@ -176,6 +177,14 @@ int ListPages(std::ostream& out) {
   std::size_t width = 0;
   for (const ZEPAppPage& p : AppPages()) width = std::max(width, p.name.size());
   for (const ZEPAppPage& p : AppPages()) out << Pad(p.name, width) << "  " << p.title << "\n";
+  return kExitOk;
+}
+
+// What the sketcher reads from the same repositories (the grid page writes part of it).
+int Sketcher(const Request& iRequest, std::ostream& out, std::ostream& err) {
+  Session session(out, err);
+  if (int rc = session.Start(iRequest, false)) return rc;
+  PrintSketcherSettings(out, &session.File());
   return kExitOk;
 }
 
@@ -426,6 +435,7 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
   lock->add_option("attribute", r.attribute, "Stored attribute name, such as DrwPaperLengthUnit")->required();
   CLI::App* unlock = app.add_subcommand("unlock", "Unlock a setting in the administrator's file");
   unlock->add_option("attribute", r.attribute, "Stored attribute name")->required();
+  CLI::App* sketcher = app.add_subcommand("sketcher", "Print the sketcher settings read from the same files");
   CLI::App* render = app.add_subcommand("render", "Draw pages as a self-contained HTML file");
   render->add_option("--html", r.html, "Output file, - for standard output")->required();
   render->add_option("pages", r.pages, "Pages to draw (default: all)");
@@ -445,6 +455,7 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
   if (*lock) return LockOrUnlock(r, true, out, err);
   if (*unlock) return LockOrUnlock(r, false, out, err);
   if (*render) return Render(r, out, err);
+  if (*sketcher) return Sketcher(r, out, err);
   return Overview(r, out, err);
 }
 

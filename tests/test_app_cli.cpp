@@ -1,0 +1,388 @@
+// The drafting-options command line: in-process runs of RunCli, and end-to-end runs of the
+// binary, each on settings files in a fresh temporary folder.
+#include "TestSupport.h"
+#include "ZEPAppBinding.h"
+#include "ZEPAppCli.h"
+#include "ZEPAppPages.h"
+#include "ZEPAppRender.h"
+#include "ZEPAppSettingsFile.h"
+
+#include <nlohmann/json.hpp>
+
+#include <cmath>
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <random>
+#include <regex>
+#include <sstream>
+
+#include <sys/wait.h>
+
+using namespace zepapp;
+namespace fs = std::filesystem;
+
+namespace {
+
+struct Result {
+  int code = -1;
+  std::string out, err;
+};
+
+std::string ReadBytes(const fs::path& iPath) {
+  std::ifstream in(iPath, std::ios::binary);
+  return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
+}
+
+// The texts of every control and section title in the page catalogs.
+std::vector<std::string> CatalogTitles() {
+  std::vector<std::string> titles;
+  const std::regex titleLine(R"re(^\s*\w+\.Title\s*=\s*"(.*)";)re");
+  for (const auto& entry : fs::directory_iterator(ZEPMsgCatalog::ResourceDir() + "/catalogs")) {
+    std::ifstream in(entry.path());
+    std::string line;
+    std::smatch m;
+    while (std::getline(in, line))
+      if (std::regex_search(line, m, titleLine)) titles.push_back(m[1]);
+  }
+  return titles;
+}
+
+std::size_t Count(const std::string& iText, const std::string& iWhat) {
+  std::size_t n = 0;
+  for (auto at = iText.find(iWhat); at != std::string::npos; at = iText.find(iWhat, at + 1)) ++n;
+  return n;
+}
+
+class AppCli : public ZEPHostTest {
+protected:
+  void SetUp() override {
+    ZEPHostTest::SetUp();
+    std::random_device rd;
+    _dir = fs::temp_directory_path() / ("zep-cli-" + std::to_string(rd()) + std::to_string(rd()));
+    fs::create_directories(_dir);
+    _settings = (_dir / "settings.json").string();
+    _admin = (_dir / "admin.json").string();
+  }
+  void TearDown() override {
+    std::error_code ec;
+    fs::remove_all(_dir, ec);
+    ZEPHostTest::TearDown();
+  }
+
+  // In-process, on the folder's files.
+  Result Run(std::vector<std::string> iArgs) {
+    std::vector<std::string> args = {"drafting-options", "--settings", _settings, "--admin", _admin};
+    args.insert(args.end(), iArgs.begin(), iArgs.end());
+    std::vector<const char*> argv;
+    for (const std::string& a : args) argv.push_back(a.c_str());
+    std::ostringstream out, err;
+    Result r;
+    r.code = RunCli(static_cast<int>(argv.size()), argv.data(), out, err);
+    r.out = out.str();
+    r.err = err.str();
+    return r;
+  }
+
+  // The real binary, with the home and configuration folders moved into the temporary folder.
+  Result RunBinary(const std::vector<std::string>& iArgs, bool iWithFiles = true) {
+    auto quote = [](const std::string& s) {
+      std::string q = "'";
+      for (char c : s) q += c == '\'' ? std::string("'\\''") : std::string(1, c);
+      return q + "'";
+    };
+    std::string cmd = "env -u DRAFTING_OPTIONS_SETTINGS -u DRAFTING_OPTIONS_ADMIN -u XDG_CONFIG_HOME HOME=" +
+                      quote(_dir.string()) + " " + quote(ZEP_APP_BINARY);
+    if (iWithFiles) cmd += " --settings " + quote(_settings) + " --admin " + quote(_admin);
+    for (const std::string& a : iArgs) cmd += " " + quote(a);
+    cmd += " >" + quote((_dir / "out.txt").string()) + " 2>" + quote((_dir / "err.txt").string());
+    const int status = std::system(cmd.c_str());
+    Result r;
+    r.code = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    r.out = ReadBytes(_dir / "out.txt");
+    r.err = ReadBytes(_dir / "err.txt");
+    return r;
+  }
+
+  nlohmann::json UserFile() const { return nlohmann::json::parse(ReadBytes(_settings)); }
+  // The stored values of an attribute of the user's file, as doubles.
+  std::vector<double> Stored(const std::string& iRepository, const std::string& iAttribute) const {
+    const nlohmann::json file = UserFile();
+    const nlohmann::json& entry = file.at("settings").at(iRepository).at(iAttribute);
+    const nlohmann::json& value = entry.contains("double") ? entry["double"] : entry.at("int");
+    std::vector<double> values;
+    if (value.is_array())
+      for (const auto& v : value) values.push_back(v.get<double>());
+    else values.push_back(value.get<double>());
+    return values;
+  }
+
+  fs::path _dir;
+  std::string _settings, _admin;
+};
+
+// The number a spinner shows and its unit symbol.
+std::pair<double, std::string> Shown(const std::string& iText) {
+  std::istringstream in(iText);
+  std::pair<double, std::string> shown;
+  in >> shown.first >> shown.second;
+  return shown;
+}
+
+} // namespace
+
+TEST_F(AppCli, SetOperatesEachKindOfControlAndPersists) {
+  const ZEPAppSetting* axis = FindSetting("General", "2DAxisLength");
+  const ZEPAppSetting* frame = FindSetting("General", "ViewFrame");
+  ASSERT_TRUE(axis && frame);
+
+  // A check box: off, then off again (no click, nothing new written).
+  EXPECT_EQ(Run({"set", "general", frame->control, "off"}).code, kExitOk);
+  EXPECT_EQ(Stored(frame->repository, frame->stored), std::vector<double>{0});
+  const std::string saved = ReadBytes(_settings);
+  Result again = Run({"set", "general", frame->control, "off"});
+  EXPECT_EQ(again.code, kExitOk);
+  EXPECT_NE(again.out.find("unchanged"), std::string::npos) << again.out;
+  EXPECT_EQ(ReadBytes(_settings), saved);
+  EXPECT_EQ(Run({"get", "general", frame->control}).out, "off\n");
+
+  // A length spinner, in its display unit or with a unit; stored in millimetres.
+  const struct {
+    const char* typed;
+    double millimetres;
+  } lengths[] = {{"40", 40.0}, {"25mm", 25.0}, {"2.5cm", 25.0}, {"0.03 m", 30.0}, {"1in", 25.4}, {"1 ft", 304.8}};
+  for (const auto& l : lengths) {
+    Result r = Run({"set", "general", axis->control, l.typed});
+    ASSERT_EQ(r.code, kExitOk) << l.typed << ": " << r.err;
+    ASSERT_EQ(Stored(axis->repository, axis->stored).size(), 1u);
+    EXPECT_NEAR(Stored(axis->repository, axis->stored)[0], l.millimetres, 1e-9) << l.typed;
+    const auto shown = Shown(Run({"get", "general", axis->control}).out);
+    EXPECT_NEAR(shown.first, l.millimetres, 5e-4) << l.typed;
+    EXPECT_EQ(shown.second, "mm");
+  }
+
+  // A combo by its line number (from 1), by its text, by the start of its text.
+  const ZEPAppSetting* unit = FindSetting("General", "PaperLengthUnit");
+  const struct {
+    const char* typed;
+    double code;
+  } lines[] = {{"2", 3}, {"Inch (in)", 5}, {"millim", 1}, {"cm", 3}};
+  for (const auto& l : lines) {
+    ASSERT_EQ(Run({"set", "general", unit->control, l.typed}).code, kExitOk) << l.typed;
+    EXPECT_EQ(Stored(unit->repository, unit->stored), std::vector<double>{l.code}) << l.typed;
+  }
+}
+
+TEST_F(AppCli, BadValuesAreRefusedWithWhatTheControlAccepts) {
+  const ZEPAppSetting* axis = FindSetting("General", "2DAxisLength");
+  const ZEPAppSetting* grad = FindSetting("Grid", "GradH");
+  const ZEPAppSetting* unit = FindSetting("General", "PaperLengthUnit");
+  const struct {
+    const char* page;
+    std::string control;
+    const char* typed;
+    const char* told; // part of what the message must say
+  } cases[] = {
+      {"general", axis->control, "15deg", "length unit"}, {"general", axis->control, "abc", "not a number"},
+      {"general", axis->control, "nan", "not a number"},  {"general", axis->control, "1e400", "too large"},
+      {"general", axis->control, "-1mm", "from 0 mm to"},  {"general", axis->control, "200m", "outside the limits"},
+      {"grid", grad->control, "12.5", "whole number"},     {"grid", grad->control, "3mm", "without a unit"},
+      {"grid", grad->control, "0", "from 1 to"},           {"general", unit->control, "4", "Inch (in)"},
+      {"general", unit->control, "parsec", "1  Millimetre (mm)"},
+      {"general", FindSetting("General", "ViewFrame")->control, "maybe", "on or off"},
+  };
+  for (const auto& c : cases) {
+    Result r = Run({"set", c.page, c.control, c.typed});
+    EXPECT_EQ(r.code, kExitBadValue) << c.typed;
+    EXPECT_NE(r.err.find(c.told), std::string::npos) << c.typed << ": " << r.err;
+  }
+  EXPECT_FALSE(fs::exists(_settings)); // nothing was ever written
+}
+
+TEST_F(AppCli, UnknownNamesListTheValidOnes) {
+  Result page = Run({"show", "nosuchpage"});
+  EXPECT_EQ(page.code, kExitUsage);
+  for (const ZEPAppPage& p : AppPages()) EXPECT_NE(page.err.find(p.name), std::string::npos) << p.name;
+
+  Result control = Run({"set", "grid", "nosuchcontrol", "1"});
+  EXPECT_EQ(control.code, kExitUsage);
+  for (const ZEPAppSetting& s : AppSettings())
+    if (s.page == "Grid") {
+      EXPECT_NE(control.err.find(s.control), std::string::npos) << s.control;
+    }
+
+  Result attribute = Run({"lock", "NoSuchAttribute"});
+  EXPECT_EQ(attribute.code, kExitUsage);
+  for (const ZEPAppSetting& s : AppSettings()) EXPECT_NE(attribute.err.find(s.stored), std::string::npos);
+
+  EXPECT_EQ(Run({"reset"}).code, kExitUsage);
+  EXPECT_EQ(Run({"show", "general", "--range", "2"}).code, kExitUsage); // no scale range there
+  EXPECT_EQ(Run({"show", "grid", "--range", "6"}).code, kExitUsage);
+  EXPECT_EQ(Run({"reset", "grid", "cmbGridRange"}).code, kExitUsage); // it stores nothing
+  EXPECT_EQ(Run({"--version"}).code, kExitOk);
+  EXPECT_FALSE(fs::exists(_settings));
+}
+
+TEST_F(AppCli, GridValuesPerScaleRangeAndTheDistortionRule) {
+  const ZEPAppSetting* spacing = FindSetting("Grid", "PrimSpaceH");
+  const ZEPAppSetting* vertical = FindSetting("Grid", "PrimSpaceV");
+  const ZEPAppSetting* distortions = FindSetting("Grid", "AllowDistortions");
+  ASSERT_EQ(Run({"set", "grid", spacing->control, "50mm", "--range", "3"}).code, kExitOk);
+  std::vector<double> expected = spacing->defaults;
+  expected[2] = 50.0; // only range 3
+  EXPECT_EQ(Stored(spacing->repository, spacing->stored), expected);
+  EXPECT_EQ(Run({"get", "grid", spacing->control, "--range", "3"}).out, "50 mm\n");
+  EXPECT_NE(Run({"get", "grid", spacing->control}).out, "50 mm\n");
+
+  // Vertical spacing follows the horizontal one until distortions are allowed for that range.
+  Result refused = Run({"set", "grid", vertical->control, "30mm"});
+  EXPECT_EQ(refused.code, kExitRefused);
+  EXPECT_NE(refused.err.find("disabled while \"Allow distortions\" is off"), std::string::npos) << refused.err;
+  EXPECT_NE(Run({"show", "grid"}).out.find("(disabled)"), std::string::npos);
+  ASSERT_EQ(Run({"set", "grid", distortions->control, "on"}).code, kExitOk);
+  ASSERT_EQ(Run({"set", "grid", vertical->control, "30mm"}).code, kExitOk);
+  EXPECT_EQ(Stored(vertical->repository, vertical->stored)[0], 30.0);
+  EXPECT_EQ(Run({"set", "grid", vertical->control, "30mm", "--range", "2"}).code, kExitRefused);
+
+  // Reset puts every range back.
+  ASSERT_EQ(Run({"reset", "grid", spacing->control}).code, kExitOk);
+  EXPECT_FALSE(UserFile()["settings"][spacing->repository].contains(spacing->stored));
+  ASSERT_EQ(Run({"reset", "--all"}).code, kExitOk);
+  EXPECT_TRUE(UserFile()["settings"].empty());
+}
+
+TEST_F(AppCli, PaperUnitChangesWhatPaperLengthsShow) {
+  const ZEPAppSetting* offset = FindSetting("PrimaryView", "DefaultOffsetBetViews");
+  const double millimetres = offset->defaults[0];
+  auto before = Shown(Run({"get", "primary-view", offset->control}).out);
+  EXPECT_EQ(before.second, "mm");
+  EXPECT_NEAR(before.first, millimetres, 5e-4);
+
+  ASSERT_EQ(Run({"set", "general", "cmbPaperLengthUnit", "inch"}).code, kExitOk);
+  auto after = Shown(Run({"get", "primary-view", offset->control}).out);
+  EXPECT_EQ(after.second, "in");
+  EXPECT_NEAR(after.first, millimetres / 25.4, 5e-4);
+  // A plain number is now inches; the model lengths of the other pages stay in millimetres.
+  ASSERT_EQ(Run({"set", "primary-view", offset->control, "2"}).code, kExitOk);
+  EXPECT_NEAR(Stored(offset->repository, offset->stored)[0], 50.8, 1e-9);
+  EXPECT_EQ(Shown(Run({"get", "general", "spinnerViewAxisSize"}).out).second, "mm");
+}
+
+TEST_F(AppCli, LockedSettingIsRefusedEverywhereAndShowsItsPadlock) {
+  const ZEPAppSetting* unit = FindSetting("General", "PaperLengthUnit");
+  ASSERT_EQ(Run({"set", "general", unit->control, "cm"}).code, kExitOk);
+  Result locked = Run({"lock", unit->stored});
+  ASSERT_EQ(locked.code, kExitOk) << locked.err;
+  const std::string who = CurrentUserName();
+  const std::string where = fs::absolute(_admin).lexically_normal().string();
+
+  const std::string before = ReadBytes(_settings);
+  for (const auto& args : {std::vector<std::string>{"set", "general", unit->control, "mm"},
+                           std::vector<std::string>{"reset", "general", unit->control}}) {
+    Result r = Run(args);
+    EXPECT_EQ(r.code, kExitRefused) << args[0];
+    EXPECT_NE(r.err.find(who), std::string::npos) << r.err;
+    EXPECT_NE(r.err.find(where), std::string::npos) << r.err;
+  }
+  EXPECT_EQ(ReadBytes(_settings), before);
+  // Reset of everything keeps the locked setting at the administrator's value.
+  ASSERT_EQ(Run({"reset", "--all"}).code, kExitOk);
+  EXPECT_EQ(Run({"get", "general", unit->control}).out, "Centimetre (cm)\n");
+
+  std::istringstream show(Run({"show", "general"}).out);
+  std::string line, unitLine;
+  while (std::getline(show, line))
+    if (line.find(unit->control) != std::string::npos) unitLine = line;
+  EXPECT_NE(unitLine.find("\xF0\x9F\x94\x92"), std::string::npos) << unitLine;
+  EXPECT_NE(unitLine.find(who + " in " + where), std::string::npos) << unitLine;
+
+  const std::string html = Run({"render", "--html", "-", "general"}).out;
+  const std::regex padlock("<span class=\"padlock (\\w+)\" data-name=\"" + unit->control + "Lock\" title=\"([^\"]*)\"");
+  std::smatch m;
+  ASSERT_TRUE(std::regex_search(html, m, padlock));
+  EXPECT_EQ(m[1], "locked");
+  EXPECT_NE(m[2].str().find(who), std::string::npos);
+  EXPECT_EQ(Count(html, "class=\"padlock locked\""), 2u); // this one and the legend's
+
+  // Unlocked: the user may change it again; a second unlock changes nothing.
+  ASSERT_EQ(Run({"unlock", unit->stored}).code, kExitOk);
+  EXPECT_NE(Run({"unlock", unit->stored}).out.find("was not locked"), std::string::npos);
+  EXPECT_EQ(Run({"set", "general", unit->control, "mm"}).code, kExitOk);
+  // Locking needs an administrator's file.
+  Result noAdmin = Run({"--admin", "", "lock", unit->stored});
+  EXPECT_EQ(noAdmin.code, kExitUsage);
+}
+
+TEST_F(AppCli, FaultyFileIsReportedAndNeverWritten) {
+  const std::string faulty = "{\n  \"format\": 1,\n  \"settings\": [\n";
+  std::ofstream(_settings, std::ios::binary) << faulty;
+  Result show = Run({"show", "general"});
+  EXPECT_EQ(show.code, kExitOk);
+  EXPECT_NE(show.err.find(_settings + ":"), std::string::npos) << show.err;
+  EXPECT_FALSE(show.out.empty());
+  for (const auto& args : {std::vector<std::string>{"set", "general", "checkViewFrame", "off"},
+                           std::vector<std::string>{"reset", "--all"}, std::vector<std::string>{"lock", "DrwViewFrame"}}) {
+    Result r = Run(args);
+    EXPECT_EQ(r.code, kExitFile) << args[0];
+    EXPECT_NE(r.err.find(_settings + ":"), std::string::npos) << r.err;
+  }
+  EXPECT_EQ(ReadBytes(_settings), faulty);
+  EXPECT_FALSE(fs::exists(_admin));
+}
+
+TEST_F(AppCli, RenderIsOneSelfContainedDialog) {
+  ASSERT_EQ(Run({"lock", "Drw_settings_GridDisplay"}).code, kExitOk);
+  const fs::path file = _dir / "pages.html";
+  Result r = Run({"render", "--html", file.string()});
+  ASSERT_EQ(r.code, kExitOk) << r.err;
+  const std::string html = ReadBytes(file);
+  for (const char* external : {"http:", "https:", "<link", "src=", "@import", "url(", "<script"})
+    EXPECT_EQ(html.find(external), std::string::npos) << external;
+  for (const ZEPAppPage& p : AppPages()) EXPECT_NE(html.find(">" + p.title + "<"), std::string::npos) << p.title;
+  for (const std::string& title : CatalogTitles()) EXPECT_NE(html.find(EscapeHtml(title)), std::string::npos) << title;
+  // A padlock beside every lock-aware control (and two in the legend); disabled ones greyed.
+  EXPECT_EQ(Count(html, "class=\"padlock "), AppSettings().size() + 2);
+  EXPECT_NE(html.find("class=\"spinner disabled\" data-name=\"editorGridSpacingV_dialog\""), std::string::npos);
+  EXPECT_NE(html.find("class=\"check on disabled\" data-name=\"checkGrid_dialog\""), std::string::npos);
+
+  // Only the pages asked for.
+  const std::string grid = Run({"render", "--html", "-", "grid"}).out;
+  EXPECT_NE(grid.find("id=\"page-grid\""), std::string::npos);
+  EXPECT_EQ(grid.find("id=\"page-general\""), std::string::npos);
+  EXPECT_EQ(Run({"render", "--html", "-", "nosuchpage"}).code, kExitUsage);
+}
+
+// ---- the binary --------------------------------------------------------------------------------
+TEST_F(AppCli, BinaryShowsEveryPageOnTheEmbeddedDefault) {
+  Result r = RunBinary({}, false);
+  ASSERT_EQ(r.code, 0) << r.err;
+  for (const ZEPAppPage& p : AppPages()) EXPECT_NE(r.out.find(p.title + "  [" + p.name + "]"), std::string::npos);
+  EXPECT_NE(r.out.find((_dir / ".config/drafting-options/settings.json").string()), std::string::npos) << r.out;
+  EXPECT_FALSE(fs::exists(_dir / ".config")); // showing writes nothing
+  EXPECT_EQ(RunBinary({"--version"}).out.find("drafting-options "), 0u);
+}
+
+TEST_F(AppCli, BinarySetGetLockAndRender) {
+  const ZEPAppSetting* spacing = FindSetting("Grid", "PrimSpaceH");
+  Result set = RunBinary({"set", "grid", spacing->control, "2.5cm"});
+  ASSERT_EQ(set.code, 0) << set.err;
+  EXPECT_EQ(Stored(spacing->repository, spacing->stored)[0], 25.0);
+  EXPECT_EQ(RunBinary({"get", "grid", spacing->control}).out, "25 mm\n"); // a new run reads the file
+
+  ASSERT_EQ(RunBinary({"lock", spacing->stored}).code, 0);
+  const std::string before = ReadBytes(_settings);
+  Result refused = RunBinary({"set", "grid", spacing->control, "40mm"});
+  EXPECT_EQ(refused.code, kExitRefused);
+  EXPECT_NE(refused.err.find("Locked by " + CurrentUserName() + " in "), std::string::npos) << refused.err;
+  EXPECT_EQ(ReadBytes(_settings), before);
+  EXPECT_TRUE(std::regex_search(RunBinary({"show", "grid"}).out, std::regex("25 mm +\xF0\x9F\x94\x92 Locked by")));
+
+  Result bad = RunBinary({"set", "grid", "checkSnap", "sometimes"});
+  EXPECT_EQ(bad.code, kExitBadValue);
+  EXPECT_NE(bad.err.find("on or off"), std::string::npos);
+
+  ASSERT_EQ(RunBinary({"render", "--html", (_dir / "out.html").string()}).code, 0);
+  EXPECT_NE(ReadBytes(_dir / "out.html").find("class=\"padlock locked\" data-name=\"" + spacing->control + "Lock\""),
+            std::string::npos);
+}
