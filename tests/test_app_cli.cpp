@@ -51,7 +51,8 @@ std::vector<std::string> CatalogTitles() {
 
 std::size_t Count(const std::string& iText, const std::string& iWhat) {
   std::size_t n = 0;
-  for (auto at = iText.find(iWhat); at != std::string::npos; at = iText.find(iWhat, at + 1)) ++n;
+  for (auto at = iText.find(iWhat); at != std::string::npos; at = iText.find(iWhat, at + 1))
+    ++n;
   return n;
 }
 
@@ -73,10 +74,12 @@ protected:
 
   // In-process, on the folder's files.
   Result Run(std::vector<std::string> iArgs) {
-    std::vector<std::string> args = {"drafting-options", "--settings", _settings, "--admin", _admin};
+    std::vector<std::string> args = {"drafting-options", "--settings", _settings, "--admin",
+                                     _admin};
     args.insert(args.end(), iArgs.begin(), iArgs.end());
     std::vector<const char*> argv;
-    for (const std::string& a : args) argv.push_back(a.c_str());
+    for (const std::string& a : args)
+      argv.push_back(a.c_str());
     std::ostringstream out, err;
     Result r;
     r.code = RunCli(static_cast<int>(argv.size()), argv.data(), out, err);
@@ -89,13 +92,16 @@ protected:
   Result RunBinary(const std::vector<std::string>& iArgs, bool iWithFiles = true) {
     auto quote = [](const std::string& s) {
       std::string q = "'";
-      for (char c : s) q += c == '\'' ? std::string("'\\''") : std::string(1, c);
+      for (char c : s)
+        q += c == '\'' ? std::string("'\\''") : std::string(1, c);
       return q + "'";
     };
-    std::string cmd = "env -u DRAFTING_OPTIONS_SETTINGS -u DRAFTING_OPTIONS_ADMIN -u XDG_CONFIG_HOME HOME=" +
-                      quote(_dir.string()) + " " + quote(ZEP_APP_BINARY);
+    std::string cmd =
+        "env -u DRAFTING_OPTIONS_SETTINGS -u DRAFTING_OPTIONS_ADMIN -u XDG_CONFIG_HOME HOME=" +
+        quote(_dir.string()) + " " + quote(ZEP_APP_BINARY);
     if (iWithFiles) cmd += " --settings " + quote(_settings) + " --admin " + quote(_admin);
-    for (const std::string& a : iArgs) cmd += " " + quote(a);
+    for (const std::string& a : iArgs)
+      cmd += " " + quote(a);
     cmd += " >" + quote((_dir / "out.txt").string()) + " 2>" + quote((_dir / "err.txt").string());
     const int status = std::system(cmd.c_str());
     Result r;
@@ -113,8 +119,10 @@ protected:
     const nlohmann::json& value = entry.contains("double") ? entry["double"] : entry.at("int");
     std::vector<double> values;
     if (value.is_array())
-      for (const auto& v : value) values.push_back(v.get<double>());
-    else values.push_back(value.get<double>());
+      for (const auto& v : value)
+        values.push_back(v.get<double>());
+    else
+      values.push_back(value.get<double>());
     return values;
   }
 
@@ -151,7 +159,8 @@ TEST_F(AppCli, SetOperatesEachKindOfControlAndPersists) {
   const struct {
     const char* typed;
     double millimetres;
-  } lengths[] = {{"40", 40.0}, {"25mm", 25.0}, {"2.5cm", 25.0}, {"0.03 m", 30.0}, {"1in", 25.4}, {"1 ft", 304.8}};
+  } lengths[] = {{"40", 40.0},     {"25mm", 25.0}, {"2.5cm", 25.0},
+                 {"0.03 m", 30.0}, {"1in", 25.4},  {"1 ft", 304.8}};
   for (const auto& l : lengths) {
     Result r = Run({"set", "general", axis->control, l.typed});
     ASSERT_EQ(r.code, kExitOk) << l.typed << ": " << r.err;
@@ -184,11 +193,16 @@ TEST_F(AppCli, BadValuesAreRefusedWithWhatTheControlAccepts) {
     const char* typed;
     const char* told; // part of what the message must say
   } cases[] = {
-      {"general", axis->control, "15deg", "length unit"}, {"general", axis->control, "abc", "not a number"},
-      {"general", axis->control, "nan", "not a number"},  {"general", axis->control, "1e400", "too large"},
-      {"general", axis->control, "-1mm", "from 0 mm to"},  {"general", axis->control, "200m", "outside the limits"},
-      {"grid", grad->control, "12.5", "whole number"},     {"grid", grad->control, "3mm", "without a unit"},
-      {"grid", grad->control, "0", "from 1 to"},           {"general", unit->control, "4", "Inch (in)"},
+      {"general", axis->control, "15deg", "length unit"},
+      {"general", axis->control, "abc", "not a number"},
+      {"general", axis->control, "nan", "not a number"},
+      {"general", axis->control, "1e400", "too large"},
+      {"general", axis->control, "-1mm", "from 0 mm to"},
+      {"general", axis->control, "200m", "outside the limits"},
+      {"grid", grad->control, "12.5", "whole number"},
+      {"grid", grad->control, "3mm", "without a unit"},
+      {"grid", grad->control, "0", "from 1 to"},
+      {"general", unit->control, "4", "Inch (in)"},
       {"general", unit->control, "parsec", "1  Millimetre (mm)"},
       {"general", FindSetting("General", "ViewFrame")->control, "maybe", "on or off"},
   };
@@ -203,7 +217,8 @@ TEST_F(AppCli, BadValuesAreRefusedWithWhatTheControlAccepts) {
 TEST_F(AppCli, UnknownNamesListTheValidOnes) {
   Result page = Run({"show", "nosuchpage"});
   EXPECT_EQ(page.code, kExitUsage);
-  for (const ZEPAppPage& p : AppPages()) EXPECT_NE(page.err.find(p.name), std::string::npos) << p.name;
+  for (const ZEPAppPage& p : AppPages())
+    EXPECT_NE(page.err.find(p.name), std::string::npos) << p.name;
 
   Result control = Run({"set", "grid", "nosuchcontrol", "1"});
   EXPECT_EQ(control.code, kExitUsage);
@@ -214,7 +229,8 @@ TEST_F(AppCli, UnknownNamesListTheValidOnes) {
 
   Result attribute = Run({"lock", "NoSuchAttribute"});
   EXPECT_EQ(attribute.code, kExitUsage);
-  for (const ZEPAppSetting& s : AppSettings()) EXPECT_NE(attribute.err.find(s.stored), std::string::npos);
+  for (const ZEPAppSetting& s : AppSettings())
+    EXPECT_NE(attribute.err.find(s.stored), std::string::npos);
 
   EXPECT_EQ(Run({"reset"}).code, kExitUsage);
   EXPECT_EQ(Run({"show", "general", "--range", "2"}).code, kExitUsage); // no scale range there
@@ -238,7 +254,8 @@ TEST_F(AppCli, GridValuesPerScaleRangeAndTheDistortionRule) {
   // Vertical spacing follows the horizontal one until distortions are allowed for that range.
   Result refused = Run({"set", "grid", vertical->control, "30mm"});
   EXPECT_EQ(refused.code, kExitRefused);
-  EXPECT_NE(refused.err.find("disabled while \"Allow distortions\" is off"), std::string::npos) << refused.err;
+  EXPECT_NE(refused.err.find("disabled while \"Allow distortions\" is off"), std::string::npos)
+      << refused.err;
   EXPECT_NE(Run({"show", "grid"}).out.find("(disabled)"), std::string::npos);
   ASSERT_EQ(Run({"set", "grid", distortions->control, "on"}).code, kExitOk);
   ASSERT_EQ(Run({"set", "grid", vertical->control, "30mm"}).code, kExitOk);
@@ -298,7 +315,8 @@ TEST_F(AppCli, LockedSettingIsRefusedEverywhereAndShowsItsPadlock) {
   EXPECT_NE(unitLine.find(who + " in " + where), std::string::npos) << unitLine;
 
   const std::string html = Run({"render", "--html", "-", "general"}).out;
-  const std::regex padlock("<span class=\"padlock (\\w+)\" data-name=\"" + unit->control + "Lock\" title=\"([^\"]*)\"");
+  const std::regex padlock("<span class=\"padlock (\\w+)\" data-name=\"" + unit->control +
+                           "Lock\" title=\"([^\"]*)\"");
   std::smatch m;
   ASSERT_TRUE(std::regex_search(html, m, padlock));
   EXPECT_EQ(m[1], "locked");
@@ -322,7 +340,8 @@ TEST_F(AppCli, FaultyFileIsReportedAndNeverWritten) {
   EXPECT_NE(show.err.find(_settings + ":"), std::string::npos) << show.err;
   EXPECT_FALSE(show.out.empty());
   for (const auto& args : {std::vector<std::string>{"set", "general", "checkViewFrame", "off"},
-                           std::vector<std::string>{"reset", "--all"}, std::vector<std::string>{"lock", "DrwViewFrame"}}) {
+                           std::vector<std::string>{"reset", "--all"},
+                           std::vector<std::string>{"lock", "DrwViewFrame"}}) {
     Result r = Run(args);
     EXPECT_EQ(r.code, kExitFile) << args[0];
     EXPECT_NE(r.err.find(_settings + ":"), std::string::npos) << r.err;
@@ -339,12 +358,16 @@ TEST_F(AppCli, RenderIsOneSelfContainedDialog) {
   const std::string html = ReadBytes(file);
   for (const char* external : {"http:", "https:", "<link", "src=", "@import", "url(", "<script"})
     EXPECT_EQ(html.find(external), std::string::npos) << external;
-  for (const ZEPAppPage& p : AppPages()) EXPECT_NE(html.find(">" + p.title + "<"), std::string::npos) << p.title;
-  for (const std::string& title : CatalogTitles()) EXPECT_NE(html.find(EscapeHtml(title)), std::string::npos) << title;
+  for (const ZEPAppPage& p : AppPages())
+    EXPECT_NE(html.find(">" + p.title + "<"), std::string::npos) << p.title;
+  for (const std::string& title : CatalogTitles())
+    EXPECT_NE(html.find(EscapeHtml(title)), std::string::npos) << title;
   // A padlock beside every lock-aware control (and two in the legend); disabled ones greyed.
   EXPECT_EQ(Count(html, "class=\"padlock "), AppSettings().size() + 2);
-  EXPECT_NE(html.find("class=\"spinner disabled\" data-name=\"editorGridSpacingV_dialog\""), std::string::npos);
-  EXPECT_NE(html.find("class=\"check on disabled\" data-name=\"checkGrid_dialog\""), std::string::npos);
+  EXPECT_NE(html.find("class=\"spinner disabled\" data-name=\"editorGridSpacingV_dialog\""),
+            std::string::npos);
+  EXPECT_NE(html.find("class=\"check on disabled\" data-name=\"checkGrid_dialog\""),
+            std::string::npos);
 
   // Only the pages asked for.
   const std::string grid = Run({"render", "--html", "-", "grid"}).out;
@@ -357,8 +380,11 @@ TEST_F(AppCli, RenderIsOneSelfContainedDialog) {
 TEST_F(AppCli, BinaryShowsEveryPageOnTheEmbeddedDefault) {
   Result r = RunBinary({}, false);
   ASSERT_EQ(r.code, 0) << r.err;
-  for (const ZEPAppPage& p : AppPages()) EXPECT_NE(r.out.find(p.title + "  [" + p.name + "]"), std::string::npos);
-  EXPECT_NE(r.out.find((_dir / ".config/drafting-options/settings.json").string()), std::string::npos) << r.out;
+  for (const ZEPAppPage& p : AppPages())
+    EXPECT_NE(r.out.find(p.title + "  [" + p.name + "]"), std::string::npos);
+  EXPECT_NE(r.out.find((_dir / ".config/drafting-options/settings.json").string()),
+            std::string::npos)
+      << r.out;
   EXPECT_FALSE(fs::exists(_dir / ".config")); // showing writes nothing
   EXPECT_EQ(RunBinary({"--version"}).out.find("drafting-options "), 0u);
 }
@@ -368,21 +394,25 @@ TEST_F(AppCli, BinarySetGetLockAndRender) {
   Result set = RunBinary({"set", "grid", spacing->control, "2.5cm"});
   ASSERT_EQ(set.code, 0) << set.err;
   EXPECT_EQ(Stored(spacing->repository, spacing->stored)[0], 25.0);
-  EXPECT_EQ(RunBinary({"get", "grid", spacing->control}).out, "25 mm\n"); // a new run reads the file
+  EXPECT_EQ(RunBinary({"get", "grid", spacing->control}).out,
+            "25 mm\n"); // a new run reads the file
 
   ASSERT_EQ(RunBinary({"lock", spacing->stored}).code, 0);
   const std::string before = ReadBytes(_settings);
   Result refused = RunBinary({"set", "grid", spacing->control, "40mm"});
   EXPECT_EQ(refused.code, kExitRefused);
-  EXPECT_NE(refused.err.find("Locked by " + CurrentUserName() + " in "), std::string::npos) << refused.err;
+  EXPECT_NE(refused.err.find("Locked by " + CurrentUserName() + " in "), std::string::npos)
+      << refused.err;
   EXPECT_EQ(ReadBytes(_settings), before);
-  EXPECT_TRUE(std::regex_search(RunBinary({"show", "grid"}).out, std::regex("25 mm +\xF0\x9F\x94\x92 Locked by")));
+  EXPECT_TRUE(std::regex_search(RunBinary({"show", "grid"}).out,
+                                std::regex("25 mm +\xF0\x9F\x94\x92 Locked by")));
 
   Result bad = RunBinary({"set", "grid", "checkSnap", "sometimes"});
   EXPECT_EQ(bad.code, kExitBadValue);
   EXPECT_NE(bad.err.find("on or off"), std::string::npos);
 
   ASSERT_EQ(RunBinary({"render", "--html", (_dir / "out.html").string()}).code, 0);
-  EXPECT_NE(ReadBytes(_dir / "out.html").find("class=\"padlock locked\" data-name=\"" + spacing->control + "Lock\""),
+  EXPECT_NE(ReadBytes(_dir / "out.html")
+                .find("class=\"padlock locked\" data-name=\"" + spacing->control + "Lock\""),
             std::string::npos);
 }

@@ -21,7 +21,8 @@ namespace {
 std::string Quoted(const std::string& s) { return "\"" + s + "\""; }
 
 std::string Lower(std::string s) {
-  for (char& c : s) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+  for (char& c : s)
+    c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
   return s;
 }
 
@@ -32,7 +33,8 @@ std::string Pad(const std::string& s, std::size_t iWidth) {
 
 std::string ScaleName(int iRange) {
   ZEPICkeScalesServices_var scales = ZEPGlobalFunctions2::GetScalesServices();
-  return scales ? scales->GetScaleName(static_cast<ZEPCkeScale>(iRange)).str() : std::to_string(iRange);
+  return scales ? scales->GetScaleName(static_cast<ZEPCkeScale>(iRange)).str()
+                : std::to_string(iRange);
 }
 
 // What the command line asked for.
@@ -58,11 +60,13 @@ public:
   int Start(const Request& iRequest, bool iWrites) {
     _paths = ResolveSettingsPaths(iRequest.settings, iRequest.admin);
     const long rc = _file.Load(_paths.user, _paths.admin);
-    for (const std::string& name : AppRepositories()) _file.OpenSettings(name);
+    for (const std::string& name : AppRepositories())
+      _file.OpenSettings(name);
     ApplyDefaults();
     _pRoot = std::make_unique<ZEPDlgWindow>(nullptr, "DraftingOptions", 0);
     if (SUCCEEDED(rc)) return kExitOk;
-    for (const ZEPAppFileError& e : _file.LoadErrors()) _err << (iWrites ? "error: " : "warning: ") << e.Text() << "\n";
+    for (const ZEPAppFileError& e : _file.LoadErrors())
+      _err << (iWrites ? "error: " : "warning: ") << e.Text() << "\n";
     if (iWrites) {
       _err << "error: nothing was changed; correct or remove the faulty file, then try again\n";
       return kExitFile;
@@ -75,7 +79,8 @@ public:
   const ZEPAppPage* Page(const std::string& iName) {
     if (const ZEPAppPage* page = FindPage(Lower(iName))) return page;
     _err << "error: unknown page " << Quoted(iName) << "; the pages are:";
-    for (const ZEPAppPage& p : AppPages()) _err << " " << p.name;
+    for (const ZEPAppPage& p : AppPages())
+      _err << " " << p.name;
     _err << "\n";
     return nullptr;
   }
@@ -104,17 +109,22 @@ public:
   const ZEPAppControl* Control(const ZEPAppPage& iPage, const std::vector<ZEPAppControl>& iControls,
                                const std::string& iName) {
     if (const ZEPAppControl* control = FindPageControl(iControls, iName)) return control;
-    _err << "error: unknown control " << Quoted(iName) << " on page " << iPage.name << "; its controls are:\n";
+    _err << "error: unknown control " << Quoted(iName) << " on page " << iPage.name
+         << "; its controls are:\n";
     std::size_t width = 0;
-    for (const ZEPAppControl& c : iControls) width = std::max(width, c.name.size());
-    for (const ZEPAppControl& c : iControls) _err << "  " << Pad(c.name, width) << "  " << c.Title() << "\n";
+    for (const ZEPAppControl& c : iControls)
+      width = std::max(width, c.name.size());
+    for (const ZEPAppControl& c : iControls)
+      _err << "  " << Pad(c.name, width) << "  " << c.Title() << "\n";
     return nullptr;
   }
 
   // The page as lines: section titles, then each control's title, value and marks.
-  void Print(const ZEPAppPage& iPage, const std::vector<ZEPAppControl>& iControls, bool iWithNames) {
+  void Print(const ZEPAppPage& iPage, const std::vector<ZEPAppControl>& iControls,
+             bool iWithNames) {
     _out << iPage.title << "  [" << iPage.name << "]";
-    if (int range = ShownRange(iControls)) _out << "  scale range " << range << ": " << ScaleName(range);
+    if (int range = ShownRange(iControls))
+      _out << "  scale range " << range << ": " << ScaleName(range);
     _out << "\n";
     std::size_t nameWidth = 0, titleWidth = 0, valueWidth = 0;
     for (const ZEPAppControl& c : iControls) {
@@ -129,11 +139,14 @@ public:
         if (!section.empty()) _out << "  " << section << "\n";
       }
       std::string marks;
-      if (c.Locked()) marks += "  \xF0\x9F\x94\x92 " + c.LockText();
-      else if (c.Disabled()) marks += "  (disabled)";
+      if (c.Locked())
+        marks += "  \xF0\x9F\x94\x92 " + c.LockText();
+      else if (c.Disabled())
+        marks += "  (disabled)";
       std::string line = "    ";
       if (iWithNames) line += Pad(c.name, nameWidth) + "  ";
-      line += Pad(c.Title(), titleWidth) + "  " + (marks.empty() ? c.Shown() : Pad(c.Shown(), valueWidth) + marks);
+      line += Pad(c.Title(), titleWidth) + "  " +
+              (marks.empty() ? c.Shown() : Pad(c.Shown(), valueWidth) + marks);
       _out << line << "\n";
     }
   }
@@ -162,7 +175,8 @@ int Overview(const Request& iRequest, std::ostream& out, std::ostream& err) {
   if (int rc = session.Start(iRequest, false)) return rc;
   out << "Drafting options\n";
   out << "  settings: " << Described(session.Paths().user, "none (nothing can be saved)") << "\n";
-  out << "  administrator's settings: " << (session.Paths().admin.empty() ? "none" : session.Paths().admin) << "\n";
+  out << "  administrator's settings: "
+      << (session.Paths().admin.empty() ? "none" : session.Paths().admin) << "\n";
   for (const ZEPAppPage& page : AppPages()) {
     std::vector<ZEPAppControl> controls;
     if (int rc = session.Controls(page, 0, controls)) return rc;
@@ -175,8 +189,10 @@ int Overview(const Request& iRequest, std::ostream& out, std::ostream& err) {
 
 int ListPages(std::ostream& out) {
   std::size_t width = 0;
-  for (const ZEPAppPage& p : AppPages()) width = std::max(width, p.name.size());
-  for (const ZEPAppPage& p : AppPages()) out << Pad(p.name, width) << "  " << p.title << "\n";
+  for (const ZEPAppPage& p : AppPages())
+    width = std::max(width, p.name.size());
+  for (const ZEPAppPage& p : AppPages())
+    out << Pad(p.name, width) << "  " << p.title << "\n";
   return kExitOk;
 }
 
@@ -241,13 +257,16 @@ int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
   out << outcome.message;
   const ZEPAppSetting* setting = SettingOf(*page, *control);
   if (setting && setting->defaults.size() > 1 && ShownRange(controls))
-    out << "  (scale range " << ShownRange(controls) << ": " << ScaleName(ShownRange(controls)) << ")";
+    out << "  (scale range " << ShownRange(controls) << ": " << ScaleName(ShownRange(controls))
+        << ")";
+  if (!setting) out << "  (only for this run: it stores nothing; --range N chooses a range)";
   out << "\n";
   return kExitOk;
 }
 
 int Reset(const Request& iRequest, std::ostream& out, std::ostream& err) {
-  if (iRequest.all == !iRequest.page.empty() || (!iRequest.page.empty() && iRequest.control.empty())) {
+  if (iRequest.all == !iRequest.page.empty() ||
+      (!iRequest.page.empty() && iRequest.control.empty())) {
     err << "error: reset takes PAGE CONTROL, or --all\n";
     return kExitUsage;
   }
@@ -276,12 +295,15 @@ int Reset(const Request& iRequest, std::ostream& out, std::ostream& err) {
   if (!control) return kExitUsage;
   const ZEPAppSetting* setting = SettingOf(*page, *control);
   if (!setting) {
-    err << "error: " << Quoted(control->Title()) << " (" << control->name << ") keeps no setting of its own\n";
+    err << "error: " << Quoted(control->Title()) << " (" << control->name
+        << ") keeps no setting of its own\n";
     return kExitUsage;
   }
-  ZEPSysSettingRepository* repo = ZEPSysSettingRepository::GetRepository(setting->repository.c_str());
+  ZEPSysSettingRepository* repo =
+      ZEPSysSettingRepository::GetRepository(setting->repository.c_str());
   ZEPSettingInfo info;
-  if (repo && repo->IsLocked(setting->stored) && SUCCEEDED(repo->GetLockInfo(setting->stored, info))) {
+  if (repo && repo->IsLocked(setting->stored) &&
+      SUCCEEDED(repo->GetLockInfo(setting->stored, info))) {
     err << "error: " << Quoted(control->Title()) << " is locked: "
         << (info.GetLockText().empty() ? "Locked by an administrator" : info.GetLockText())
         << "\nnothing was changed\n";
@@ -307,7 +329,8 @@ const ZEPAppSetting* Attribute(const std::string& iName, std::ostream& err) {
     if (Lower(s.stored) == Lower(iName)) return &s;
   err << "error: unknown attribute " << Quoted(iName) << "; the attributes are:\n";
   std::size_t width = 0;
-  for (const ZEPAppSetting& s : AppSettings()) width = std::max(width, s.stored.size());
+  for (const ZEPAppSetting& s : AppSettings())
+    width = std::max(width, s.stored.size());
   for (const ZEPAppSetting& s : AppSettings()) {
     std::string page = s.page;
     for (const ZEPAppPage& p : AppPages())
@@ -344,7 +367,8 @@ int LockOrUnlock(const Request& iRequest, bool iLock, std::ostream& out, std::os
       if (const ZEPAppControl* c = FindPageControl(controls, setting->control))
         shown = c->Title() + " (" + p.name + " " + c->name + ") = " + c->Shown();
     }
-  out << (iLock ? "Locked " : "Unlocked ") << setting->stored << " in " << session.File().AdminPath() << "\n";
+  out << (iLock ? "Locked " : "Unlocked ") << setting->stored << " in "
+      << session.File().AdminPath() << "\n";
   if (!shown.empty()) out << "  " << shown << "\n";
   return kExitOk;
 }
@@ -359,7 +383,8 @@ int Render(const Request& iRequest, std::ostream& out, std::ostream& err) {
     if (std::find(pages.begin(), pages.end(), page) == pages.end()) pages.push_back(page);
   }
   if (pages.empty())
-    for (const ZEPAppPage& p : AppPages()) pages.push_back(&p);
+    for (const ZEPAppPage& p : AppPages())
+      pages.push_back(&p);
   std::vector<ZEPAppRenderPage> rendered;
   bool ranged = false;
   for (const ZEPAppPage* page : pages) {
@@ -389,53 +414,63 @@ int Render(const Request& iRequest, std::ostream& out, std::ostream& err) {
     err << "error: " << error << "\n";
     return kExitFile;
   }
-  out << "Wrote " << iRequest.html << " (" << rendered.size() << (rendered.size() == 1 ? " page" : " pages")
-      << ")\n";
+  out << "Wrote " << iRequest.html << " (" << rendered.size()
+      << (rendered.size() == 1 ? " page" : " pages") << ")\n";
   return kExitOk;
 }
 
 int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err) {
-  CLI::App app{"The drafting options dialog of the CAD host on its settings files: show the pages,\n"
-               "change a setting through its control as a user would, lock settings, render the pages.",
-               kAppName};
+  CLI::App app{
+      "The drafting options dialog of the CAD host on its settings files: show the pages,\n"
+      "change a setting through its control as a user would, lock settings, render the pages.",
+      kAppName};
   app.fallthrough(); // global options also after the command
   app.require_subcommand(0, 1);
   app.set_version_flag("--version", std::string(kAppName) + " " + kAppVersion);
   Request r;
-  app.add_option("--settings", r.settings, "The user's settings file (default: $" + std::string(kSettingsFileEnv) +
-                                               ", else $XDG_CONFIG_HOME or ~/.config, drafting-options/settings.json)");
+  app.add_option("--settings", r.settings,
+                 "The user's settings file (default: $" + std::string(kSettingsFileEnv) +
+                     ", else $XDG_CONFIG_HOME or ~/.config, drafting-options/settings.json)");
   app.add_option("--admin", r.admin,
-                 "The administrator's settings file: defaults and locks (default: $" + std::string(kAdminFileEnv) +
-                     ", else none)");
+                 "The administrator's settings file: defaults and locks (default: $" +
+                     std::string(kAdminFileEnv) + ", else none)");
   auto rangeOption = [&r](CLI::App* cmd) {
-    cmd->add_option("--range", r.range, "Grid page: the scale range to work on, 1 to 5")->check(CLI::Range(1, 5));
+    cmd->add_option("--range", r.range, "Grid page: the scale range to work on, 1 to 5")
+        ->check(CLI::Range(1, 5));
   };
 
   CLI::App* pages = app.add_subcommand("pages", "List the pages");
-  CLI::App* show = app.add_subcommand("show", "Show a page: each control's name, title, value and padlock");
+  CLI::App* show =
+      app.add_subcommand("show", "Show a page: each control's name, title, value and padlock");
   show->add_option("page", r.page, "Page name")->required();
   rangeOption(show);
   CLI::App* get = app.add_subcommand("get", "Print the value a control shows");
   get->add_option("page", r.page, "Page name")->required();
   get->add_option("control", r.control, "Control name (see show)")->required();
   rangeOption(get);
-  CLI::App* set = app.add_subcommand("set", "Operate a control with a value, as a user would, and save");
+  CLI::App* set =
+      app.add_subcommand("set", "Operate a control with a value, as a user would, and save");
   set->add_option("page", r.page, "Page name")->required();
   set->add_option("control", r.control, "Control name (see show)")->required();
-  set->add_option("value", r.value,
-                  "on/off for a check box; a number with an optional unit (25mm, 2.5cm, 1in, 15deg) for a "
-                  "spinner; a line number from 1 or a line's text for a combo")
+  set->add_option(
+         "value", r.value,
+         "on/off for a check box; a number with an optional unit (25mm, 2.5cm, 1in, 15deg) for a "
+         "spinner; a line number from 1 or a line's text for a combo")
       ->required();
   rangeOption(set);
-  CLI::App* reset = app.add_subcommand("reset", "Put a setting back to its default (every scale range), or all");
+  CLI::App* reset =
+      app.add_subcommand("reset", "Put a setting back to its default (every scale range), or all");
   reset->add_option("page", r.page, "Page name");
   reset->add_option("control", r.control, "Control name (see show)");
   reset->add_flag("--all", r.all, "Every setting the administrator has not locked");
-  CLI::App* lock = app.add_subcommand("lock", "Lock a setting at its current value in the administrator's file");
-  lock->add_option("attribute", r.attribute, "Stored attribute name, such as DrwPaperLengthUnit")->required();
+  CLI::App* lock =
+      app.add_subcommand("lock", "Lock a setting at its current value in the administrator's file");
+  lock->add_option("attribute", r.attribute, "Stored attribute name, such as DrwPaperLengthUnit")
+      ->required();
   CLI::App* unlock = app.add_subcommand("unlock", "Unlock a setting in the administrator's file");
   unlock->add_option("attribute", r.attribute, "Stored attribute name")->required();
-  CLI::App* sketcher = app.add_subcommand("sketcher", "Print the sketcher settings read from the same files");
+  CLI::App* sketcher =
+      app.add_subcommand("sketcher", "Print the sketcher settings read from the same files");
   CLI::App* render = app.add_subcommand("render", "Draw pages as a self-contained HTML file");
   render->add_option("--html", r.html, "Output file, - for standard output")->required();
   render->add_option("pages", r.pages, "Pages to draw (default: all)");

@@ -14,7 +14,8 @@ namespace zepapp {
 namespace {
 
 std::string Lower(std::string s) {
-  for (char& c : s) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+  for (char& c : s)
+    c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
   return s;
 }
 
@@ -51,14 +52,16 @@ struct UnitWord {
   ZEPDlgUnit unit;
 };
 const UnitWord kUnitWords[] = {
-    {"mm", 45},       {"millimetre", 45}, {"millimetres", 45}, {"millimeter", 45}, {"millimeters", 45},
-    {"cm", 46},       {"centimetre", 46}, {"centimetres", 46}, {"centimeter", 46}, {"centimeters", 46},
-    {"m", 43},        {"metre", 43},      {"metres", 43},      {"meter", 43},      {"meters", 43},
-    {"km", 47},       {"um", 44},         {"\xC2\xB5m", 44},   {"micron", 44},     {"microns", 44},
-    {"in", 48},       {"inch", 48},       {"inches", 48},      {"\"", 48},         {"ft", 49},
-    {"foot", 49},     {"feet", 49},       {"'", 49},           {"deg", 12},        {"degree", 12},
-    {"degrees", 12},  {"\xC2\xB0", 12},   {"rad", 11},         {"radian", 11},     {"radians", 11},
-    {"gr", 15},       {"grad", 15},       {"grade", 15},       {"grades", 15},     {"gon", 15},
+    {"mm", 45},          {"millimetre", 45},  {"millimetres", 45}, {"millimeter", 45},
+    {"millimeters", 45}, {"cm", 46},          {"centimetre", 46},  {"centimetres", 46},
+    {"centimeter", 46},  {"centimeters", 46}, {"m", 43},           {"metre", 43},
+    {"metres", 43},      {"meter", 43},       {"meters", 43},      {"km", 47},
+    {"um", 44},          {"\xC2\xB5m", 44},   {"micron", 44},      {"microns", 44},
+    {"in", 48},          {"inch", 48},        {"inches", 48},      {"\"", 48},
+    {"ft", 49},          {"foot", 49},        {"feet", 49},        {"'", 49},
+    {"deg", 12},         {"degree", 12},      {"degrees", 12},     {"\xC2\xB0", 12},
+    {"rad", 11},         {"radian", 11},      {"radians", 11},     {"gr", 15},
+    {"grad", 15},        {"grade", 15},       {"grades", 15},      {"gon", 15},
 };
 // The short forms listed in messages.
 const char* const kLengthWords = "mm, cm, m, km, in, ft";
@@ -85,7 +88,8 @@ std::size_t NumberLength(const std::string& s) {
   std::size_t i = 0;
   auto digits = [&] {
     std::size_t from = i;
-    while (i < s.size() && std::isdigit(static_cast<unsigned char>(s[i]))) ++i;
+    while (i < s.size() && std::isdigit(static_cast<unsigned char>(s[i])))
+      ++i;
     return i - from;
   };
   if (i < s.size() && (s[i] == '+' || s[i] == '-')) ++i;
@@ -126,7 +130,8 @@ const Dependency kDependencies[] = {
 };
 
 void Walk(ZEPDialog* iWidget, std::string iSection, std::vector<ZEPAppControl>& oControls) {
-  if (auto* section = ZEPSysDynamicCast<ZEPDlgToolsOptionsFrame>(iWidget)) iSection = section->GetTitle().str();
+  if (auto* section = ZEPSysDynamicCast<ZEPDlgToolsOptionsFrame>(iWidget))
+    iSection = section->GetTitle().str();
   if (auto* lockAware = dynamic_cast<ZEPDrwLockDialog*>(iWidget)) {
     if (ZEPDialog* inner = lockAware->GetDialog())
       oControls.push_back({iWidget->GetOwnName(), iWidget, inner, lockAware, iSection});
@@ -140,7 +145,8 @@ void Walk(ZEPDialog* iWidget, std::string iSection, std::vector<ZEPAppControl>& 
       oControls.push_back({iWidget->GetOwnName(), iWidget, iWidget, nullptr, iSection});
     return;
   }
-  for (ZEPDialog* child : iWidget->GetChildren()) Walk(child, iSection, oControls);
+  for (ZEPDialog* child : iWidget->GetChildren())
+    Walk(child, iSection, oControls);
 }
 
 } // namespace
@@ -179,7 +185,9 @@ std::string ZEPAppControl::Shown() const {
   return "";
 }
 
-bool ZEPAppControl::Locked() const { return lockAware && lockAware->GetLock() && lockAware->GetLock()->IsLocked(); }
+bool ZEPAppControl::Locked() const {
+  return lockAware && lockAware->GetLock() && lockAware->GetLock()->IsLocked();
+}
 
 std::string ZEPAppControl::LockText() const {
   if (!Locked()) return "";
@@ -200,18 +208,21 @@ std::string ZEPAppControl::Accepts() const {
     const Magnitude m = MagnitudeOf(s->GetUnit());
     if (m == Magnitude::None) {
       const std::string what = TakesWholeNumbers(*s) ? "a whole number" : "a number";
-      return s->HasLimits() ? what + " from " + s->FormatValue(lo) + " to " + s->FormatValue(hi) : what;
+      return s->HasLimits() ? what + " from " + s->FormatValue(lo) + " to " + s->FormatValue(hi)
+                            : what;
     }
     std::string text = m == Magnitude::Length ? "a length" : "an angle";
     if (s->HasLimits()) text += " from " + s->FormatValue(lo) + " to " + s->FormatValue(hi);
-    text += ", in " + s->UnitSymbol() + " or with a unit (" + (m == Magnitude::Length ? kLengthWords : kAngleWords) +
-            ")";
+    text += ", in " + s->UnitSymbol() + " or with a unit (" +
+            (m == Magnitude::Length ? kLengthWords : kAngleWords) + ")";
     return text;
   }
   case ZEPAppKind::Combo: {
     const std::vector<std::string> lines = Lines(*PickableCombo(inner));
-    std::string text = "a line number from 1 to " + std::to_string(lines.size()) + " or the text of a line:";
-    for (std::size_t i = 0; i < lines.size(); ++i) text += "\n  " + std::to_string(i + 1) + "  " + lines[i];
+    std::string text =
+        "a line number from 1 to " + std::to_string(lines.size()) + " or the text of a line:";
+    for (std::size_t i = 0; i < lines.size(); ++i)
+      text += "\n  " + std::to_string(i + 1) + "  " + lines[i];
     return text;
   }
   case ZEPAppKind::Other:
@@ -224,11 +235,13 @@ std::string ZEPAppControl::Accepts() const {
 std::vector<ZEPAppControl> PageControls(ZEPDialog* iPage) {
   std::vector<ZEPAppControl> controls;
   if (iPage)
-    for (ZEPDialog* child : iPage->GetChildren()) Walk(child, "", controls);
+    for (ZEPDialog* child : iPage->GetChildren())
+      Walk(child, "", controls);
   return controls;
 }
 
-const ZEPAppControl* FindPageControl(const std::vector<ZEPAppControl>& iControls, const std::string& iName) {
+const ZEPAppControl* FindPageControl(const std::vector<ZEPAppControl>& iControls,
+                                     const std::string& iName) {
   if (const ZEPAppControl* exact = ByName(iControls, iName)) return exact;
   const ZEPAppControl* found = nullptr;
   for (const ZEPAppControl& c : iControls)
@@ -259,7 +272,9 @@ std::string WhyRefused(const std::vector<ZEPAppControl>& iControls, const ZEPApp
     std::string text = title + " is disabled while " + Quoted(needed->Title()) + " is off";
     if (int range = ShownRange(iControls)) {
       ZEPICkeScalesServices_var scales = ZEPGlobalFunctions2::GetScalesServices();
-      if (scales) text += " for the " + scales->GetScaleName(static_cast<ZEPCkeScale>(range)).str() + " scale range";
+      if (scales)
+        text += " for the " + scales->GetScaleName(static_cast<ZEPCkeScale>(range)).str() +
+                " scale range";
     }
     return text + "; turn " + Quoted(needed->Title()) + " (" + needed->name + ") on first";
   }
@@ -293,7 +308,8 @@ bool ParseSpinnerValue(const ZEPDlgSpinner& iSpinner, const std::string& iText, 
       return false;
     }
     if (!unit || MagnitudeOf(unit->unit) != own) {
-      oError = Quoted(word) + " is not " + (own == Magnitude::Length ? "a length unit (" : "an angle unit (") +
+      oError = Quoted(word) + " is not " +
+               (own == Magnitude::Length ? "a length unit (" : "an angle unit (") +
                (own == Magnitude::Length ? kLengthWords : kAngleWords) + ")";
       return false;
     }
@@ -330,8 +346,8 @@ ZEPAppOutcome Fail(int iCode, std::string iMessage) {
 }
 
 ZEPAppOutcome BadValue(const ZEPAppControl& iControl, const std::string& iWhy) {
-  return Fail(kExitBadValue, iWhy + "; " + Quoted(iControl.Title()) + " (" + iControl.name + ") takes " +
-                                 iControl.Accepts());
+  return Fail(kExitBadValue, iWhy + "; " + Quoted(iControl.Title()) + " (" + iControl.name +
+                                 ") takes " + iControl.Accepts());
 }
 
 ZEPAppOutcome Refused(const ZEPAppControl& iControl) {
@@ -343,7 +359,8 @@ ZEPAppOutcome Refused(const ZEPAppControl& iControl) {
 int FindLine(const std::vector<std::string>& iLines, const std::string& iText) {
   const std::string wanted = Lower(Trim(iText));
   if (wanted.empty()) return -1;
-  if (std::all_of(wanted.begin(), wanted.end(), [](char c) { return std::isdigit(static_cast<unsigned char>(c)); })) {
+  if (std::all_of(wanted.begin(), wanted.end(),
+                  [](char c) { return std::isdigit(static_cast<unsigned char>(c)); })) {
     if (wanted.size() > 6) return -1;
     const int n = std::atoi(wanted.c_str());
     return n >= 1 && n <= static_cast<int>(iLines.size()) ? n - 1 : -1;
@@ -352,7 +369,9 @@ int FindLine(const std::vector<std::string>& iLines, const std::string& iText) {
   const Test tests[] = {
       [](const std::string& l, const std::string& w) { return l == w; },
       [](const std::string& l, const std::string& w) { return l.rfind(w, 0) == 0; },
-      [](const std::string& l, const std::string& w) { return l.find("(" + w + ")") != std::string::npos; },
+      [](const std::string& l, const std::string& w) {
+        return l.find("(" + w + ")") != std::string::npos;
+      },
   };
   for (Test test : tests) {
     int found = -1, count = 0;
@@ -369,18 +388,22 @@ int FindLine(const std::vector<std::string>& iLines, const std::string& iText) {
 
 } // namespace
 
-ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl,
-                             const std::string& iText) {
+ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls,
+                             const ZEPAppControl& iControl, const std::string& iText) {
   const std::string why = WhyRefused(iControls, iControl);
   if (!why.empty()) return Fail(kExitRefused, why);
   switch (iControl.Kind()) {
   case ZEPAppKind::Check: {
     const std::string word = Lower(Trim(iText));
     bool on = false;
-    if (word == "on" || word == "yes" || word == "true" || word == "1") on = true;
-    else if (word == "off" || word == "no" || word == "false" || word == "0") on = false;
-    else return BadValue(iControl, Quoted(iText) + " is neither on nor off");
-    const bool isOn = ZEPSysDynamicCast<ZEPDlgCheckButton>(iControl.inner)->GetState() == ZEPDlgChecked;
+    if (word == "on" || word == "yes" || word == "true" || word == "1")
+      on = true;
+    else if (word == "off" || word == "no" || word == "false" || word == "0")
+      on = false;
+    else
+      return BadValue(iControl, Quoted(iText) + " is neither on nor off");
+    const bool isOn =
+        ZEPSysDynamicCast<ZEPDlgCheckButton>(iControl.inner)->GetState() == ZEPDlgChecked;
     if (isOn == on) return Done(iControl, false);
     if (!ZEPDlgDriver::Click(iControl.inner)) return Refused(iControl);
     return Done(iControl, true);
@@ -420,15 +443,17 @@ ZEPAppOutcome SelectRange(const std::vector<ZEPAppControl>& iControls, int iRang
   if (!range) return Fail(kExitUsage, "this page has no scale range");
   if (ShownRange(iControls) == iRange) return Done(*range, false);
   ZEPICkeScalesServices_var scales = ZEPGlobalFunctions2::GetScalesServices();
-  const std::string name =
-      scales && iRange >= 1 && iRange <= 5 ? scales->GetScaleName(static_cast<ZEPCkeScale>(iRange)).str() : "";
+  const std::string name = scales && iRange >= 1 && iRange <= 5
+                               ? scales->GetScaleName(static_cast<ZEPCkeScale>(iRange)).str()
+                               : "";
   const std::vector<std::string> lines = Lines(*static_cast<ZEPDlgCombo*>(range->widget));
   const auto it = name.empty() ? lines.end() : std::find(lines.begin(), lines.end(), name);
   if (it == lines.end())
     return BadValue(*range, "scale range " + std::to_string(iRange) + " is not activated");
   const std::string why = WhyRefused(iControls, *range);
   if (!why.empty()) return Fail(kExitRefused, why);
-  if (!ZEPDlgDriver::Select(range->inner, static_cast<int>(it - lines.begin()))) return Refused(*range);
+  if (!ZEPDlgDriver::Select(range->inner, static_cast<int>(it - lines.begin())))
+    return Refused(*range);
   return Done(*range, true);
 }
 

@@ -26,11 +26,11 @@ enum class ZEPAppKind { Check, Spinner, Combo, Other };
 // One control of a page: a lock-aware control, or an operable control without padlock
 // (the grid page's scale range combo).
 struct ZEPAppControl {
-  std::string name;                     // "editorGridSpacing"
-  ZEPDialog* widget = nullptr;          // the widget of that name
-  ZEPDialog* inner = nullptr;           // what the user operates
+  std::string name;                      // "editorGridSpacing"
+  ZEPDialog* widget = nullptr;           // the widget of that name
+  ZEPDialog* inner = nullptr;            // what the user operates
   ZEPDrwLockDialog* lockAware = nullptr; // null without padlock
-  std::string section;                  // title of its section
+  std::string section;                   // title of its section
 
   ZEPAppKind Kind() const;
   std::string Title() const;
@@ -49,7 +49,8 @@ struct ZEPAppControl {
 // Every control of a page, in tree order.
 std::vector<ZEPAppControl> PageControls(ZEPDialog* iPage);
 // By name; an exact match first, else the only case-insensitive one. Null if none.
-const ZEPAppControl* FindPageControl(const std::vector<ZEPAppControl>& iControls, const std::string& iName);
+const ZEPAppControl* FindPageControl(const std::vector<ZEPAppControl>& iControls,
+                                     const std::string& iName);
 
 // Why the user cannot operate the control, as a sentence naming who locked it and where, or
 // what keeps it disabled; empty when it can be operated.
@@ -57,13 +58,13 @@ std::string WhyRefused(const std::vector<ZEPAppControl>& iControls, const ZEPApp
 
 struct ZEPAppOutcome {
   int code = kExitOk;
-  std::string message; // what happened, or why not
+  std::string message;  // what happened, or why not
   bool changed = false; // the user action was performed
 };
 
 // Operates the control with iText as a user would (click, enter, select), or refuses.
-ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl,
-                             const std::string& iText);
+ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls,
+                             const ZEPAppControl& iControl, const std::string& iText);
 
 // A spinner value typed by the user: a number with an optional unit ("25mm", "2.5 cm", "1in",
 // "15deg"), in the internal unit of the spinner (metres, radians, plain numbers). False with

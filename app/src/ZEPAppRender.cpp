@@ -9,12 +9,23 @@ std::string EscapeHtml(const std::string& iText) {
   out.reserve(iText.size());
   for (char c : iText) {
     switch (c) {
-    case '&': out += "&amp;"; break;
-    case '<': out += "&lt;"; break;
-    case '>': out += "&gt;"; break;
-    case '"': out += "&quot;"; break;
-    case '\'': out += "&#39;"; break;
-    default: out += c;
+    case '&':
+      out += "&amp;";
+      break;
+    case '<':
+      out += "&lt;";
+      break;
+    case '>':
+      out += "&gt;";
+      break;
+    case '"':
+      out += "&quot;";
+      break;
+    case '\'':
+      out += "&#39;";
+      break;
+    default:
+      out += c;
     }
   }
   return out;
@@ -28,9 +39,12 @@ const char* const kOpenLock = "\xF0\x9F\x94\x93";   // U+1F513
 // Padlocks are drawn rather than left to an emoji font the reader may lack; the emoji stays
 // in the text for copying and searching.
 std::string Padlock(bool iLocked) {
-  const char* shackle = iLocked ? "M4.5 7.5V5a3.5 3.5 0 0 1 7 0v2.5" : "M11 7.5V3.8a3 3 0 0 0-6 0v.9";
-  return std::string("<svg viewBox=\"0 0 16 16\" width=\"14\" height=\"14\" aria-hidden=\"true\"><path d=\"") +
-         shackle + "\" fill=\"none\" stroke=\"currentColor\" stroke-width=\"1.7\"/><rect x=\"2.5\" y=\"7\" " +
+  const char* shackle =
+      iLocked ? "M4.5 7.5V5a3.5 3.5 0 0 1 7 0v2.5" : "M11 7.5V3.8a3 3 0 0 0-6 0v.9";
+  return std::string("<svg viewBox=\"0 0 16 16\" width=\"14\" height=\"14\" "
+                     "aria-hidden=\"true\"><path d=\"") +
+         shackle +
+         "\" fill=\"none\" stroke=\"currentColor\" stroke-width=\"1.7\"/><rect x=\"2.5\" y=\"7\" " +
          "width=\"11\" height=\"8\" rx=\"1.6\" fill=\"currentColor\"/></svg><span class=\"sr\">" +
          (iLocked ? kClosedLock : kOpenLock) + "</span>";
 }
@@ -90,14 +104,16 @@ std::string CellStyle(const ZEPDialog& w) {
   const int width = c.width > 0 ? c.width : 1;
   const int height = c.height > 0 ? c.height : 1;
   std::ostringstream s;
-  s << "grid-row:" << c.row + 1 << " / span " << height << ";grid-column:" << c.column + 1 << " / span " << width;
+  s << "grid-row:" << c.row + 1 << " / span " << height << ";grid-column:" << c.column + 1
+    << " / span " << width;
   return s.str();
 }
 
 // Class, name, tooltip and cell of an element.
 std::string Attributes(const ZEPDialog& w, std::string iClass, const std::string& iTooltip) {
   const bool hidden = w.GetVisibility() == ZEPDlgHide;
-  if (hidden) iClass += " hidden";
+  if (hidden)
+    iClass += " hidden";
   else if (!w.IsEffectivelyEnabled() && !ZEPSysDynamicCast<ZEPDlgLock>(const_cast<ZEPDialog*>(&w)))
     iClass += " disabled";
   std::string out = " class=\"" + iClass + "\" data-name=\"" + EscapeHtml(w.GetOwnName()) + "\"";
@@ -114,7 +130,8 @@ std::string Tooltip(const ZEPDialog& w) {
 void Render(const ZEPDialog& w, std::string& out);
 
 void Children(const ZEPDialog& w, std::string& out) {
-  for (const ZEPDialog* child : w.GetChildren()) Render(*child, out);
+  for (const ZEPDialog* child : w.GetChildren())
+    Render(*child, out);
 }
 
 void RenderCombo(const ZEPDialog& w, const ZEPDlgCombo& combo, std::string& out) {
@@ -122,7 +139,8 @@ void RenderCombo(const ZEPDialog& w, const ZEPDlgCombo& combo, std::string& out)
   for (int i = 0; i < combo.GetLineCount(); ++i) {
     ZEPUnicodeString text;
     combo.GetLine(text, i);
-    lines += (i ? "\n" : "") + std::string(i == combo.GetSelect() ? "\xE2\x97\x8F " : "\xE2\x97\x8B ") + text.str();
+    lines += (i ? "\n" : "") +
+             std::string(i == combo.GetSelect() ? "\xE2\x97\x8F " : "\xE2\x97\x8B ") + text.str();
     if (i == combo.GetSelect()) selected = text.str();
   }
   std::string tip = w.GetTitle().str();
@@ -136,15 +154,17 @@ void Render(const ZEPDialog& w, std::string& out) {
   auto* self = const_cast<ZEPDialog*>(&w);
   if (auto* lock = ZEPSysDynamicCast<ZEPDlgLock>(self)) {
     const bool locked = lock->IsLocked();
-    std::string tip = locked ? (lock->GetLockText().empty() ? "Locked by an administrator" : lock->GetLockText())
-                             : "Not locked: this setting can be changed";
-    out += "<span" + Attributes(w, locked ? "padlock locked" : "padlock open", tip) + " aria-label=\"" +
-           (locked ? "locked" : "not locked") + "\">" + Padlock(locked) + "</span>";
+    std::string tip =
+        locked ? (lock->GetLockText().empty() ? "Locked by an administrator" : lock->GetLockText())
+               : "Not locked: this setting can be changed";
+    out += "<span" + Attributes(w, locked ? "padlock locked" : "padlock open", tip) +
+           " aria-label=\"" + (locked ? "locked" : "not locked") + "\">" + Padlock(locked) +
+           "</span>";
     return;
   }
   if (auto* section = ZEPSysDynamicCast<ZEPDlgToolsOptionsFrame>(self)) {
-    out += "<fieldset" + Attributes(w, "section", "") + "><legend>" + EscapeHtml(section->GetTitle().str()) +
-           "</legend>";
+    out += "<fieldset" + Attributes(w, "section", "") + "><legend>" +
+           EscapeHtml(section->GetTitle().str()) + "</legend>";
     for (const ZEPDialog* child : w.GetChildren()) {
       out += "<div class=\"grid\">";
       Children(*child, out); // the options frame's controls
@@ -159,15 +179,16 @@ void Render(const ZEPDialog& w, std::string& out) {
       return;
     }
     const bool on = check->GetState() == ZEPDlgChecked;
-    out += "<span" + Attributes(w, on ? "check on" : "check", Tooltip(w)) + "><span class=\"box\">" +
-           (on ? "&#10003;" : "") + "</span><span class=\"text\">" + EscapeHtml(w.GetTitle().str()) +
-           "</span></span>";
+    out += "<span" + Attributes(w, on ? "check on" : "check", Tooltip(w)) +
+           "><span class=\"box\">" + (on ? "&#10003;" : "") + "</span><span class=\"text\">" +
+           EscapeHtml(w.GetTitle().str()) + "</span></span>";
     return;
   }
   if (auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(self)) {
     const bool on = radio->GetState() == ZEPDlgChecked;
     out += "<span" + Attributes(w, on ? "radio on" : "radio", Tooltip(w)) +
-           "><span class=\"box\"></span><span class=\"text\">" + EscapeHtml(w.GetTitle().str()) + "</span></span>";
+           "><span class=\"box\"></span><span class=\"text\">" + EscapeHtml(w.GetTitle().str()) +
+           "</span></span>";
     return;
   }
   if (auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(self)) {
@@ -188,11 +209,13 @@ void Render(const ZEPDialog& w, std::string& out) {
     return;
   }
   if (ZEPSysDynamicCast<ZEPDlgPushButton>(self)) {
-    out += "<span" + Attributes(w, "push", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) + "</span>";
+    out += "<span" + Attributes(w, "push", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) +
+           "</span>";
     return;
   }
   if (ZEPSysDynamicCast<ZEPDlgLabel>(self)) {
-    out += "<span" + Attributes(w, "label", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) + "</span>";
+    out += "<span" + Attributes(w, "label", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) +
+           "</span>";
     return;
   }
   // A frame: its own grid. Lock-aware controls keep the padlock column narrow.
@@ -208,7 +231,8 @@ void Render(const ZEPDialog& w, std::string& out) {
 
 } // namespace
 
-std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages, const ZEPAppRenderContext& iContext) {
+std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages,
+                       const ZEPAppRenderContext& iContext) {
   std::string out;
   out += "<!DOCTYPE html>\n<html lang=\"en\">\n<head>\n<meta charset=\"utf-8\">\n";
   out += "<meta name=\"generator\" content=\"" + EscapeHtml(iContext.generator) + "\">\n";
@@ -220,22 +244,25 @@ std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages, const ZEPApp
     out += "#tab-" + id + ":checked~.tabs label[for=tab-" + id +
            "]{background:#f7f8f9;color:#000;font-weight:600;padding-bottom:6px}\n";
   }
-  out += "</style>\n</head>\n<body>\n<div class=\"dialog\" role=\"dialog\" aria-label=\"Options\">\n";
-  out += "<div class=\"titlebar\"><span class=\"icon\"></span>Options &#8211; Drafting<span class=\"close\">"
+  out +=
+      "</style>\n</head>\n<body>\n<div class=\"dialog\" role=\"dialog\" aria-label=\"Options\">\n";
+  out += "<div class=\"titlebar\"><span class=\"icon\"></span>Options &#8211; Drafting<span "
+         "class=\"close\">"
          "&#10005;</span></div>\n<div class=\"body\">\n";
   bool first = true;
   for (const ZEPAppRenderPage& p : iPages) {
-    out += "<input class=\"tab\" type=\"radio\" name=\"page\" id=\"tab-" + EscapeHtml(p.name) + "\"" +
-           (first ? " checked" : "") + ">\n";
+    out += "<input class=\"tab\" type=\"radio\" name=\"page\" id=\"tab-" + EscapeHtml(p.name) +
+           "\"" + (first ? " checked" : "") + ">\n";
     first = false;
   }
   out += "<div class=\"tabs\" role=\"tablist\">";
   for (const ZEPAppRenderPage& p : iPages)
-    out += "<label for=\"tab-" + EscapeHtml(p.name) + "\" role=\"tab\">" + EscapeHtml(p.title) + "</label>";
+    out += "<label for=\"tab-" + EscapeHtml(p.name) + "\" role=\"tab\">" + EscapeHtml(p.title) +
+           "</label>";
   out += "</div>\n<div class=\"panels\">\n";
   for (const ZEPAppRenderPage& p : iPages) {
-    out += "<section class=\"page\" id=\"page-" + EscapeHtml(p.name) + "\" role=\"tabpanel\">\n<h2>" +
-           EscapeHtml(p.title) + "</h2>\n";
+    out += "<section class=\"page\" id=\"page-" + EscapeHtml(p.name) +
+           "\" role=\"tabpanel\">\n<h2>" + EscapeHtml(p.title) + "</h2>\n";
     if (!p.note.empty()) out += "<p class=\"note\">" + EscapeHtml(p.note) + "</p>\n";
     if (p.frame) {
       out += "<div class=\"pagegrid\">";
@@ -246,13 +273,15 @@ std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages, const ZEPApp
   }
   out += "</div>\n</div>\n<div class=\"footer\">";
   out += "<span>Settings: <code>" +
-         EscapeHtml(iContext.settingsPath.empty() ? "none (not saved)" : iContext.settingsPath) + "</code></span>";
+         EscapeHtml(iContext.settingsPath.empty() ? "none (not saved)" : iContext.settingsPath) +
+         "</code></span>";
   out += "<span>Administrator&#39;s settings: <code>" +
          EscapeHtml(iContext.adminPath.empty() ? "none" : iContext.adminPath) + "</code></span>";
   out += "<span><span class=\"padlock locked\">" + Padlock(true) +
-         "</span>locked (hover for who and where) &#183; <span class=\"padlock open\">" + Padlock(false) +
-         "</span>not locked &#183; greyed: not available</span>";
-  out += "</div>\n<div class=\"buttons\"><span class=\"push\">OK</span><span class=\"push\">Cancel</span></div>\n";
+         "</span>locked (hover for who and where) &#183; <span class=\"padlock open\">" +
+         Padlock(false) + "</span>not locked &#183; greyed: not available</span>";
+  out += "</div>\n<div class=\"buttons\"><span class=\"push\">OK</span><span "
+         "class=\"push\">Cancel</span></div>\n";
   out += "</div>\n</body>\n</html>\n";
   return out;
 }

@@ -10,20 +10,21 @@
 namespace zepapp {
 
 struct ZEPAppRenderPage {
-  std::string name;           // "grid": anchors and tab ids
-  std::string title;          // "Grid"
+  std::string name;                 // "grid": anchors and tab ids
+  std::string title;                // "Grid"
   const ZEPDialog* frame = nullptr; // the opened page
-  std::string note;           // a line under the page heading; may be empty
+  std::string note;                 // a line under the page heading; may be empty
 };
 
 struct ZEPAppRenderContext {
   std::string settingsPath; // shown in the footer; empty: none
   std::string adminPath;
-  std::string generator;    // "drafting-options 0.1.0"
+  std::string generator; // "drafting-options 0.1.0"
 };
 
 // The whole document. The first page is the tab shown first; no script, no external resource.
-std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages, const ZEPAppRenderContext& iContext);
+std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages,
+                       const ZEPAppRenderContext& iContext);
 
 // Text made safe for HTML content and attribute values.
 std::string EscapeHtml(const std::string& iText);
