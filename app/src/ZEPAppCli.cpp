@@ -106,6 +106,19 @@ public:
     return outcome.code;
   }
 
+  // Loads the files, then finds the request's page (showing its range) and, when asked, its
+  // control; a non-zero exit code after reporting what was wrong.
+  int Target(const Request& iRequest, bool iWrites, const ZEPAppPage*& oPage, std::vector<ZEPAppControl>& oControls,
+             const ZEPAppControl** oControl) {
+    if (int rc = Start(iRequest, iWrites)) return rc;
+    oPage = Page(iRequest.page);
+    if (!oPage) return kExitUsage;
+    if (int rc = Controls(*oPage, iRequest.range, oControls)) return rc;
+    if (!oControl) return kExitOk;
+    *oControl = Control(*oPage, oControls, iRequest.control);
+    return *oControl ? kExitOk : kExitUsage;
+  }
+
   const ZEPAppControl* Control(const ZEPAppPage& iPage, const std::vector<ZEPAppControl>& iControls,
                                const std::string& iName) {
     if (const ZEPAppControl* control = FindPageControl(iControls, iName)) return control;
@@ -206,24 +219,19 @@ int Sketcher(const Request& iRequest, std::ostream& out, std::ostream& err) {
 
 int Show(const Request& iRequest, std::ostream& out, std::ostream& err) {
   Session session(out, err);
-  if (int rc = session.Start(iRequest, false)) return rc;
-  const ZEPAppPage* page = session.Page(iRequest.page);
-  if (!page) return kExitUsage;
+  const ZEPAppPage* page = nullptr;
   std::vector<ZEPAppControl> controls;
-  if (int rc = session.Controls(*page, iRequest.range, controls)) return rc;
+  if (int rc = session.Target(iRequest, false, page, controls, nullptr)) return rc;
   session.Print(*page, controls, true);
   return kExitOk;
 }
 
 int Get(const Request& iRequest, std::ostream& out, std::ostream& err) {
   Session session(out, err);
-  if (int rc = session.Start(iRequest, false)) return rc;
-  const ZEPAppPage* page = session.Page(iRequest.page);
-  if (!page) return kExitUsage;
+  const ZEPAppPage* page = nullptr;
   std::vector<ZEPAppControl> controls;
-  if (int rc = session.Controls(*page, iRequest.range, controls)) return rc;
-  const ZEPAppControl* control = session.Control(*page, controls, iRequest.control);
-  if (!control) return kExitUsage;
+  const ZEPAppControl* control = nullptr;
+  if (int rc = session.Target(iRequest, false, page, controls, &control)) return rc;
   out << control->Shown() << "\n";
   return kExitOk;
 }
@@ -238,13 +246,10 @@ const ZEPAppSetting* SettingOf(const ZEPAppPage& iPage, const ZEPAppControl& iCo
 
 int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
   Session session(out, err);
-  if (int rc = session.Start(iRequest, true)) return rc;
-  const ZEPAppPage* page = session.Page(iRequest.page);
-  if (!page) return kExitUsage;
+  const ZEPAppPage* page = nullptr;
   std::vector<ZEPAppControl> controls;
-  if (int rc = session.Controls(*page, iRequest.range, controls)) return rc;
-  const ZEPAppControl* control = session.Control(*page, controls, iRequest.control);
-  if (!control) return kExitUsage;
+  const ZEPAppControl* control = nullptr;
+  if (int rc = session.Target(iRequest, true, page, controls, &control)) return rc;
   const ZEPAppOutcome outcome = OperateControl(controls, *control, iRequest.value);
   if (outcome.code != kExitOk) {
     err << "error: " << outcome.message << "\nnothing was changed\n";
