@@ -57,22 +57,31 @@ template <class R> std::map<std::string, std::unique_ptr<R>>& Registry() {
   return registry;
 }
 
+// The registries of setting and preference repositories work alike.
+template <class R> R* Lookup(const char* iName) {
+  if (!iName) return nullptr;
+  auto& reg = Registry<R>();
+  auto it = reg.find(iName);
+  return it == reg.end() ? nullptr : it->second.get();
+}
+
+template <class R> R* OpenIn(const std::string& iName) {
+  auto& slot = Registry<R>()[iName];
+  if (!slot) slot = std::make_unique<R>(iName);
+  return slot.get();
+}
+
 template <class T> std::vector<T> const* As(const ZEPSysSettingRepository::Value* v) {
   return v ? std::get_if<std::vector<T>>(v) : nullptr;
 }
 } // namespace
 
 ZEPSysSettingRepository* ZEPSysSettingRepository::GetRepository(const char* iName, int) {
-  if (!iName) return nullptr;
-  auto& reg = Registry<ZEPSysSettingRepository>();
-  auto it = reg.find(iName);
-  return it == reg.end() ? nullptr : it->second.get();
+  return Lookup<ZEPSysSettingRepository>(iName);
 }
 
 ZEPSysSettingRepository* ZEPSysSettingRepository::Open(const std::string& iName) {
-  auto& slot = Registry<ZEPSysSettingRepository>()[iName];
-  if (!slot) slot = std::make_unique<ZEPSysSettingRepository>(iName);
-  return slot.get();
+  return OpenIn<ZEPSysSettingRepository>(iName);
 }
 
 void ZEPSysSettingRepository::Close(const std::string& iName) { Registry<ZEPSysSettingRepository>().erase(iName); }
@@ -155,16 +164,11 @@ int ZEPSysSettingRepository::ResetAttr(const std::string& iName) {
 void ZEPSysSettingRepository::SetUserValue(const std::string& iName, const Value& iValue) { _user[iName] = iValue; }
 
 ZEPSysPreferenceRepository* ZEPSysPreferenceRepository::GetPreferenceRepository(const char* iName) {
-  if (!iName) return nullptr;
-  auto& reg = Registry<ZEPSysPreferenceRepository>();
-  auto it = reg.find(iName);
-  return it == reg.end() ? nullptr : it->second.get();
+  return Lookup<ZEPSysPreferenceRepository>(iName);
 }
 
 ZEPSysPreferenceRepository* ZEPSysPreferenceRepository::Open(const std::string& iName) {
-  auto& slot = Registry<ZEPSysPreferenceRepository>()[iName];
-  if (!slot) slot = std::make_unique<ZEPSysPreferenceRepository>(iName);
-  return slot.get();
+  return OpenIn<ZEPSysPreferenceRepository>(iName);
 }
 
 void ZEPSysPreferenceRepository::Close(const std::string& iName) { Registry<ZEPSysPreferenceRepository>().erase(iName); }
