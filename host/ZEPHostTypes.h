@@ -23,7 +23,6 @@ public:
   ZEPUnicodeString(std::string iText) : _sText(std::move(iText)) {}
 
   const std::string& str() const { return _sText; }
-  const char* ConvertToChar() const { return _sText.c_str(); }
   bool IsEmpty() const { return _sText.empty(); }
 
   // Number of characters (code points; a stray byte counts as one).
@@ -85,9 +84,6 @@ public:
   const T& At(int iPos) const {
     static const T none{};
     return (iPos >= 1 && iPos <= Size()) ? _items[static_cast<size_t>(iPos - 1)] : none;
-  }
-  void Set(int iPos, const T& iValue) {
-    if (iPos >= 1 && iPos <= Size()) _items[static_cast<size_t>(iPos - 1)] = iValue;
   }
   const std::vector<T>& Items() const { return _items; }
 
