@@ -366,6 +366,9 @@ public:
   ZEPComboColor(ZEPDialog* iParent, const ZEPString& iName, unsigned long iStyle, unsigned int iRed,
                 unsigned int iGreen, unsigned int iBlue, int, int, int);
   ZEPDlgCombo* GetCombo() const { return _pCombo; }
+  // The inner combo's selection notification: it reaches callbacks registered on this combo
+  // too, with this combo as the sender, so a page can subscribe here.
+  ZEPNotification* GetComboSelectNotification() { return _pCombo->GetComboSelectNotification(); }
   // 1 and the colour when one is selected, else 0 with the outputs untouched.
   int GetSelectedColor(unsigned int* oRed, unsigned int* oGreen, unsigned int* oBlue) const;
   int GetSelectedColor(unsigned int* oRed, unsigned int* oGreen, unsigned int* oBlue, ZEPUnicodeString* oName) const;

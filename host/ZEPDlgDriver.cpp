@@ -135,6 +135,13 @@ bool ZEPDlgDriver::Close(ZEPDialog* iDialog) {
   return true;
 }
 
+bool ZEPDlgDriver::CloseDialog(ZEPDialog* iDialog) {
+  auto* dialog = ZEPSysDynamicCast<ZEPDlgDialog>(iDialog);
+  if (!dialog || !dialog->IsEffectivelyEnabled()) return false;
+  dialog->SendNotification(dialog->GetDiaCLOSENotification());
+  return true;
+}
+
 void ZEPDlgDriver::Idle() { ZEPDialog::RunDelayedDestructions(); }
 
 namespace {

@@ -25,8 +25,10 @@ public:
   // Combo line (0-based), entry of an application combo, or icon box entry.
   static bool Select(ZEPDialog* iWidget, int iIndex);
   static bool SelectColor(ZEPDialog* iWidget, unsigned int iRed, unsigned int iGreen, unsigned int iBlue);
-  // The close button of a window.
+  // The close button of a window's frame (window close notification).
   static bool Close(ZEPDialog* iDialog);
+  // The dialog's own Close button (dialog close notification).
+  static bool CloseDialog(ZEPDialog* iDialog);
   // Runs the delayed destructions.
   static void Idle();
 

@@ -5,6 +5,7 @@
 #include <cstring>
 #include <fstream>
 #include <map>
+#include <memory>
 
 // ---- strings ------------------------------------------------------------------------------
 namespace {
@@ -45,8 +46,39 @@ void ZEPUnicodeString::RemoveTail(int iCount) {
 
 // ---- object model ---------------------------------------------------------------------------
 ZEPMetaObject::ZEPMetaObject(const char* iName, const ZEPMetaObject* iBase, const char* iExtendedType,
-                             const char* iFramework)
-    : _pName(iName), _pBase(iBase), _pExtended(iExtendedType), _pFramework(iFramework) {}
+                             const char* iFramework, ZEPCreateItselfFct iCreate)
+    : _pName(iName), _pBase(iBase), _pExtended(iExtendedType), _pFramework(iFramework), _pCreate(iCreate) {}
+
+namespace {
+// Registered classes by name; the strings are kept with them.
+struct Registered {
+  std::string name, extended, framework;
+  std::unique_ptr<ZEPMetaObject> meta;
+};
+std::map<std::string, Registered>& Registry() {
+  static std::map<std::string, Registered> registry;
+  return registry;
+}
+} // namespace
+
+const ZEPMetaObject* fct_RetrieveMetaObject(const char* iName, const ZEPMetaObject* iBase, const char* iExtendedType,
+                                            const char* iFramework, ZEPCreateItselfFct iCreate) {
+  if (!iName || !*iName) return nullptr;
+  auto [it, added] = Registry().try_emplace(iName);
+  Registered& r = it->second;
+  if (added) {
+    r.name = iName;
+    r.extended = iExtendedType ? iExtendedType : "";
+    r.framework = iFramework ? iFramework : "";
+    r.meta = std::make_unique<ZEPMetaObject>(r.name.c_str(), iBase, r.extended.c_str(), r.framework.c_str(), iCreate);
+  }
+  return r.meta.get();
+}
+
+const ZEPMetaObject* ZEPFindMetaObject(const char* iName) {
+  auto it = iName ? Registry().find(iName) : Registry().end();
+  return it == Registry().end() ? nullptr : it->second.meta.get();
+}
 
 bool ZEPMetaObject::IsAKindOf(const ZEPMetaObject* iOther) const {
   for (const ZEPMetaObject* m = this; m; m = m->_pBase)

@@ -9,12 +9,19 @@
 // ---- Object model -------------------------------------------------------------------------
 class ZEPBaseUnknown;
 
+// Factory entry of a class registered with the object model: a new instance, or null.
+using ZEPCreateItselfFct = ZEPBaseUnknown* (*)();
+
 // Run-time class description: a name and the description of the base class.
 class ZEPMetaObject {
 public:
   ZEPMetaObject(const char* iName, const ZEPMetaObject* iBase, const char* iExtendedType = "ZEPnull",
-                const char* iFramework = "ZEPHost");
+                const char* iFramework = "ZEPHost", ZEPCreateItselfFct iCreate = nullptr);
   const char* GetName() const { return _pName; }
+  // The identifier the object model knows the class by: its registered name.
+  const char* ClassId() const { return _pName; }
+  // What the class's factory entry makes; null without one.
+  ZEPBaseUnknown* CreateInstance() const { return _pCreate ? _pCreate() : nullptr; }
   const ZEPMetaObject* GetBase() const { return _pBase; }
   const char* GetExtendedType() const { return _pExtended; }
   const char* GetFramework() const { return _pFramework; }
@@ -26,7 +33,15 @@ private:
   const ZEPMetaObject* _pBase;
   const char* _pExtended;
   const char* _pFramework;
+  ZEPCreateItselfFct _pCreate;
 };
+
+// The meta object registered under iName, created and registered by the first call (later
+// calls answer that one, whatever they pass). Null for a null or empty name.
+const ZEPMetaObject* fct_RetrieveMetaObject(const char* iName, const ZEPMetaObject* iBase, const char* iExtendedType,
+                                            const char* iFramework, ZEPCreateItselfFct iCreate);
+// A class registered through fct_RetrieveMetaObject; null when there is none of that name.
+const ZEPMetaObject* ZEPFindMetaObject(const char* iName);
 
 class ZEPBaseUnknown {
 public:

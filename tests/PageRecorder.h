@@ -27,6 +27,9 @@ public:
   bool allInfoSet = false;
   long allInfo = 0;
   std::set<std::string> locked;
+  // Answers of layout options and other page operations by name; unscripted ones keep the
+  // module's answer.
+  std::map<std::string, long> options;
   std::vector<HookCall> calls;
   std::vector<std::string> reads; // getters called, in order
 
@@ -85,6 +88,12 @@ public:
     oGreen = static_cast<T>(it->second[1]);
     oBlue = static_cast<T>(it->second[2]);
     return true;
+  }
+
+  // The scripted answer of operation iName, else iModule (the module's own answer).
+  long Option(const char* iName, long iModule) const {
+    auto it = options.find(iName);
+    return it == options.end() ? iModule : it->second;
   }
 
   // True and the status when the attribute's info hook is scripted.
