@@ -4,6 +4,7 @@
 #include "PageRecorder.h"
 
 #include "ZEP2DBaseOptGalFrm.h"
+#include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
@@ -39,6 +40,22 @@ protected:
 #include "ZEP2DBasePrimaryViewFrm.def"
 #undef ZEP_SETTING
   ZEPString GetFrameIconName() override { return "I_PrimaryView"; }
+};
+
+// The geometry page embeds a recording grid page on the same script, unless the script's
+// "CreateGridFrame" option is 0.
+class RecordingGeoPage : public Recording<ZEP2DBaseOptGeoFrm> {
+public:
+  RecordingGeoPage(HookScript& iScript, ZEPDialog* iParent)
+      : Recording<ZEP2DBaseOptGeoFrm>(iScript, iParent, "GeometryPage") {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptGeoFrm, Name, Kind)
+#include "ZEP2DBaseOptGeoFrm.def"
+#undef ZEP_SETTING
+  ZEP2DBaseOptGridFrm* CreateGridFrame() override {
+    return _script.Option("CreateGridFrame", 1) ? new RecordingGridPage(_script, this) : nullptr;
+  }
 };
 
 // A page built and initialised on iParent, as the host does it.

@@ -94,3 +94,36 @@ struct ZEPHookDefaults {
   }
   template <class T> static void Clear(T& oRed, T& oGreen, T& oBlue) { oRed = oGreen = oBlue = T(); }
 };
+
+// Slot indices of a page's attributes, for pages that go over rows of controls: inside the
+// page class,
+//     enum Slot {
+//   #define ZEP_SETTING(Name, Kind) ZEP_SETTING_SLOT(Name)
+//   #include "<Page>.def"
+//   #undef ZEP_SETTING
+//       kSlotCount };
+#define ZEP_SETTING_SLOT(Name) kSlot##Name,
+
+// The hooks of one attribute as member pointers, indexed by slot: the info hook of every
+// attribute; setter and getter of flags only (null for the other kinds). A table of them is
+// expanded with ZEP_SETTING_SLOT_HOOKS inside a member of the page (the hooks are protected).
+template <class Page> struct ZEPSettingSlotHooks {
+  long (Page::*info)(ZEPSettingInfo&);
+  long (Page::*set)(const unsigned char&);
+  long (Page::*get)(unsigned char&);
+};
+
+#define ZEP_IS_FLAG_Flag 1
+#define ZEP_IS_FLAG_Int 0
+#define ZEP_IS_FLAG_UInt 0
+#define ZEP_IS_FLAG_Double 0
+#define ZEP_IS_FLAG_Text 0
+#define ZEP_IS_FLAG_TextList 0
+#define ZEP_IS_FLAG_FlagArray 0
+#define ZEP_IS_FLAG_IntArray 0
+#define ZEP_IS_FLAG_DoubleArray 0
+#define ZEP_IS_FLAG_ColorInt 0
+#define ZEP_IS_FLAG_ColorUInt 0
+#define ZEP_SLOT_HOOKS_1(Page, Name) {&Page::GetSys##Name##Info, &Page::SetSys##Name, &Page::GetSys##Name},
+#define ZEP_SLOT_HOOKS_0(Page, Name) {&Page::GetSys##Name##Info, nullptr, nullptr},
+#define ZEP_SETTING_SLOT_HOOKS(Page, Name, Kind) ZEP_CAT(ZEP_SLOT_HOOKS_, ZEP_IS_FLAG_##Kind)(Page, Name)

@@ -31,8 +31,10 @@ public:
   template <class Page>
   ZEPDlgDialog* Open(Page* iPage, void (Page::*iBuild)(ZEPDlgDialog*, ZEPSettingInfo&),
                      void (Page::*iClose)(ZEPCommand*, ZEPNotification*, void*)) {
-    return OpenDialog(iPage, [iPage, iBuild](ZEPDlgDialog* d, ZEPSettingInfo& info) { (iPage->*iBuild)(d, info); },
-                      [iPage, iClose](ZEPCommand* s, ZEPNotification* n, void* d) { (iPage->*iClose)(s, n, d); });
+    return OpenDialog(
+        iPage,
+        [iPage, iBuild](ZEPDlgDialog* d, ZEPSettingInfo& info) { (iPage->*iBuild)(d, info); },
+        [iPage, iClose](ZEPCommand* s, ZEPNotification* n, void* d) { (iPage->*iClose)(s, n, d); });
   }
 
   // When iSender is the open dialog: requests its delayed destruction, forgets it, clears every

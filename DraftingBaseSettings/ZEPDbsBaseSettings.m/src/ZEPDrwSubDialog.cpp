@@ -1,10 +1,12 @@
 #include "ZEPDrwSubDialog.h"
 
-ZEPDrwSubDialog::ZEPDrwSubDialog(const ZEPString& iName, unsigned long iStyle) : _name(iName), _style(iStyle) {}
+ZEPDrwSubDialog::ZEPDrwSubDialog(const ZEPString& iName, unsigned long iStyle)
+    : _name(iName), _style(iStyle) {}
 
 ZEPDrwSubDialog::~ZEPDrwSubDialog() { _pDialog = nullptr; }
 
-ZEPDlgDialog* ZEPDrwSubDialog::OpenDialog(ZEPDialog* iPage, const Builder& iBuild, Callback iClose) {
+ZEPDlgDialog* ZEPDrwSubDialog::OpenDialog(ZEPDialog* iPage, const Builder& iBuild,
+                                          Callback iClose) {
   if (_pDialog) {
     _pDialog->SetVisibility(ZEPDlgShow);
     return nullptr;
@@ -23,6 +25,7 @@ bool ZEPDrwSubDialog::Close(ZEPCommand* iSender) {
   if (!_pDialog || iSender != _pDialog) return false;
   _pDialog->RequestDelayedDestruction();
   _pDialog = nullptr;
-  for (const auto& clear : _clearers) clear();
+  for (const auto& clear : _clearers)
+    clear();
   return true;
 }

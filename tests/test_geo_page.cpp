@@ -1,0 +1,239 @@
+// Geometry page: the embedded grid page, sensitivity rules, colours, the reference size and the
+// three sub-dialogs, operated through the driver as the user does.
+#include "RecordingPages.h"
+
+namespace {
+class GeoPage : public ZEPHostTest {
+protected:
+  // The host has the drafting options open: the paper length unit is read from them.
+  void SetUp() override {
+    ZEPHostTest::SetUp();
+    ZEPSysSettingRepository::Open("DraftingOptions");
+  }
+  void Open() { _pPage = OpenPage<RecordingGeoPage>(_script, &_root); }
+  ZEPDialog* Control(const char* iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
+  ZEPDlgCheckButton* CheckOf(const char* iName) {
+    return ZEPSysDynamicCast<ZEPDlgCheckButton>(Control(iName));
+  }
+  ZEPDlgRadioButton* Radio(const char* iName) {
+    return ZEPSysDynamicCast<ZEPDlgRadioButton>(Control(iName));
+  }
+  // Presses the push button and answers the dialog of that name it opened.
+  ZEPDlgDialog* OpenDialog(const char* iButton, const char* iDialog) {
+    EXPECT_TRUE(ZEPDlgDriver::Click(Control(iButton))) << iButton;
+    return ZEPSysDynamicCast<ZEPDlgDialog>(ZEPDlgDriver::Find(_pPage, iDialog));
+  }
+  int DialogsNamed(const char* iName) {
+    int n = 0;
+    for (ZEPDialog* child : _pPage->GetChildren())
+      n += child->GetOwnName() == iName ? 1 : 0;
+    return n;
+  }
+  std::vector<std::string> Hooks() {
+    std::vector<std::string> out;
+    for (const HookCall& c : _script.calls)
+      out.push_back(c.hook);
+    return out;
+  }
+  HookScript _script;
+  RecordingGeoPage* _pPage = nullptr;
+};
+
+const char* const kDialogs[][2] = {{"dragOptionPushButton", "geoAllowGeomManip"},
+                                   {"smartPickPushButton", "geoSmartPick"},
+                                   {"cstTypesPushButton", "geoTypeCst"}};
+} // namespace
+
+TEST_F(GeoPage, ModuleHooksShowZerosAndDisableTheDependants) {
+  Open();
+  for (const char* name :
+       {"checkCenter", "checkGeomDrag", "chkShowHV", "chkEndPtsDuplGenGeom", "checkCstCreation",
+        "checkCstVisu", "DittoInvViewScale", "DittoDrag", "DittoScale"})
+    EXPECT_EQ(CheckOf(name)->GetState(), ZEPDlgUnchecked) << name;
+  EXPECT_EQ(ZEPSysDynamicCast<ZEPDlgSpinner>(Control("editorCstRefSize"))->GetValue(), 0.0);
+  for (const char* name :
+       {"dragOptionPushButton", "editorCstRefSize", "comboCstColor", "cstTypesPushButton"})
+    EXPECT_FALSE(Control(name)->IsEffectivelyEnabled()) << name;
+  EXPECT_TRUE(Control("smartPickPushButton")->IsEffectivelyEnabled()); // no rule for it
+  // The grid page sits at the top and was initialised before the page's own values.
+  ZEPDialog* grid = ZEPDlgDriver::Find(_pPage, "GridPage");
+  ASSERT_NE(grid, nullptr);
+  EXPECT_EQ(grid->GetGridConstraints().row, 0);
+  ASSERT_FALSE(_script.reads.empty());
+  EXPECT_EQ(_script.reads.front(), "DisplayGrid");
+  EXPECT_EQ(_script.reads.back(), "DittoPreventScale");
+  EXPECT_EQ(ZEPCheckLog::Count(), 0);
+  ExpectGolden("geo_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
+}
+
+TEST_F(GeoPage, WithoutGridPageTheSectionsKeepTheirRows) {
+  _script.options["CreateGridFrame"] = 0;
+  Open();
+  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "GridPage"), nullptr);
+  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "frameCenter")->GetGridConstraints().row, 1);
+  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "frameDittoInv")->GetGridConstraints().row, 4);
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkCenter")));
+  EXPECT_EQ(Hooks(), std::vector<std::string>{"SetSysCreateGeomCenter"});
+}
+
+TEST_F(GeoPage, AllInfoHooksAnsweringZeroAndEveryDialog) {
+  _script.allInfoSet = true;
+  _script.values = {{"AllowGeomManip", {1}},   {"DisplayCst", {1}},          {"RefSizeCst", {2.5}},
+                    {"ColorCst", {255, 0, 0}}, {"SmartPick", {67, 102, 85}}, {"DragSolveMode", {1}},
+                    {"CstVisuPara", {1}},      {"SmartPickAlign", {1}}};
+  Open();
+  std::string dump = ZEPDlgDriver::Dump(_pPage);
+  for (const auto& d : kDialogs)
+    dump += ZEPDlgDriver::Dump(OpenDialog(d[0], d[1]));
+  ExpectGolden("geo_page_info_zero.dump", dump);
+}
+
+TEST_F(GeoPage, EmbeddedGridPageWritesThroughTheSameHost) {
+  Open();
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkGrid")));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("DittoDrag")));
+  EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysDisplayGrid", "SetSysDittoPreventManip"}));
+}
+
+TEST_F(GeoPage, DependantsFollowTheirCheckButtonsButLocksWin) {
+  _script.allInfoSet = true;
+  _script.locked = {"RefSizeCst"};
+  Open();
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkGeomDrag")));
+  EXPECT_TRUE(Control("dragOptionPushButton")->IsEffectivelyEnabled());
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkCstVisu")));
+  EXPECT_TRUE(Control("comboCstColor")->IsEffectivelyEnabled());
+  EXPECT_TRUE(Control("cstTypesPushButton")->IsEffectivelyEnabled());
+  EXPECT_FALSE(Control("editorCstRefSize")->IsEffectivelyEnabled()); // locked
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkCstVisu")));
+  EXPECT_FALSE(Control("comboCstColor")->IsEffectivelyEnabled());
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkGeomDrag")));
+  EXPECT_FALSE(Control("dragOptionPushButton")->IsEffectivelyEnabled());
+  ASSERT_EQ(_script.calls.size(), 4u);
+  EXPECT_EQ(_script.calls[3].hook, "SetSysAllowGeomManip");
+  EXPECT_EQ(_script.calls[3].values[0], 0.0);
+}
+
+TEST_F(GeoPage, ColoursAreReadThroughTheColourCombos) {
+  _script.values = {{"DisplayCst", {1}}, {"SmartPick", {67, 102, 85}}};
+  Open();
+  ASSERT_TRUE(ZEPDlgDriver::SelectColor(Control("cmbSmartPick"), 10, 20, 30));
+  ASSERT_TRUE(ZEPDlgDriver::SelectColor(Control("comboCstColor"), 200, 0, 7));
+  ASSERT_TRUE(ZEPDlgDriver::Select(Control("comboCstColor"), 2)); // a named line: red
+  ASSERT_EQ(Hooks(),
+            (std::vector<std::string>{"SetSysSmartPick", "SetSysColorCst", "SetSysColorCst"}));
+  EXPECT_EQ(_script.calls[0].values, (std::vector<double>{10, 20, 30}));
+  EXPECT_EQ(_script.calls[1].values, (std::vector<double>{200, 0, 7}));
+  EXPECT_EQ(_script.calls[2].values, (std::vector<double>{255, 0, 0}));
+  EXPECT_EQ(ZEPCheckLog::Count(), 0);
+}
+
+TEST_F(GeoPage, ReferenceSizeIsAPaperLengthInMillimetresAtTheHooks) {
+  int inch = 5;
+  ZEPSysSettingRepository::Open("DraftingOptions")->WriteAttr("DrwPaperLengthUnit", &inch, 1);
+  _script.values = {{"DisplayCst", {1}}, {"RefSizeCst", {2.5}}};
+  Open();
+  auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(Control("editorCstRefSize"));
+  EXPECT_DOUBLE_EQ(spinner->GetValue(), 0.0025);
+  EXPECT_EQ(spinner->UnitSymbol(), "in");
+  ASSERT_TRUE(ZEPDlgDriver::Enter(spinner, 0.004));
+  ASSERT_TRUE(ZEPDlgDriver::Enter(spinner, -1.0)); // clamped at the lower limit
+  ASSERT_EQ(_script.Calls("SetSysRefSizeCst").size(), 2u);
+  EXPECT_DOUBLE_EQ(_script.calls[0].values[0], 4.0);
+  EXPECT_DOUBLE_EQ(_script.calls[1].values[0], 0.0);
+}
+
+TEST_F(GeoPage, DragModeRadiosWriteOnlyChanges) {
+  const struct {
+    double stored;
+    const char* shown;
+  } cases[] = {{0, "radioDragModeStd"},
+               {1, "radioDragModeMin"},
+               {2, "radioDragModeRel"},
+               {7, "radioDragModeStd"}};
+  for (const auto& c : cases) {
+    _script.values = {{"AllowGeomManip", {1}}, {"DragSolveMode", {c.stored}}};
+    auto* window = new ZEPDlgWindow(&_root, "window", 0);
+    _pPage = OpenPage<RecordingGeoPage>(_script, window);
+    OpenDialog("dragOptionPushButton", "geoAllowGeomManip");
+    EXPECT_EQ(Radio(c.shown)->GetState(), ZEPDlgChecked) << c.stored;
+    delete window;
+  }
+  // Stored 7 shows the standard radio; a notification with that radio still on writes 0.
+  _script.calls.clear();
+  Open();
+  OpenDialog("dragOptionPushButton", "geoAllowGeomManip");
+  Radio("radioDragModeStd")
+      ->SendNotification(Radio("radioDragModeStd")->GetRadBModifyNotification());
+  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radioDragModeStd"))); // already on: nothing
+  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radioDragModeRel")));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radioDragModeMin")));
+  std::vector<double> written;
+  for (const HookCall& c : _script.calls)
+    written.push_back(c.values[0]);
+  EXPECT_EQ(Hooks(), std::vector<std::string>(3, "SetSysDragSolveMode"));
+  EXPECT_EQ(written, (std::vector<double>{0, 2, 1}));
+}
+
+TEST_F(GeoPage, EverySubDialogOpensOnceWritesAndForgetsItsControlsWhenClosed) {
+  _script.values = {{"AllowGeomManip", {1}},
+                    {"DisplayCst", {1}},
+                    {"SmartPickHoriVerti", {1}},
+                    {"CstVisuSym", {1}}};
+  Open();
+  EXPECT_EQ(CheckOf("checkSmartPickHoriVerti"), nullptr); // not before the push
+  const char* const inside[] = {"checkDragWithEndPts", "checkSmartPickHoriVerti",
+                                "checkCstVisuSym"};
+  const char* const hooks[] = {"SetSysDragWithEndPts", "SetSysSmartPickHoriVerti",
+                               "SetSysCstVisuSym"};
+  for (int i = 0; i < 3; ++i) {
+    for (bool windowClose : {false, true}) {
+      _script.calls.clear();
+      ZEPDlgDialog* dialog = OpenDialog(kDialogs[i][0], kDialogs[i][1]);
+      ASSERT_NE(dialog, nullptr) << kDialogs[i][1];
+      EXPECT_EQ(dialog->GetVisibility(), ZEPDlgShow);
+      // A second press shows the open dialog and creates nothing.
+      dialog->SetVisibility(ZEPDlgHide);
+      ASSERT_TRUE(ZEPDlgDriver::Click(Control(kDialogs[i][0])));
+      EXPECT_EQ(DialogsNamed(kDialogs[i][1]), 1);
+      EXPECT_EQ(dialog->GetVisibility(), ZEPDlgShow);
+      auto* check =
+          ZEPSysDynamicCast<ZEPDlgCheckButton>(ZEPDlgDriver::FindControl(dialog, inside[i]));
+      const bool wasOn = check->GetState() == ZEPDlgChecked;
+      EXPECT_EQ(wasOn, windowClose != (i != 0))
+          << "shows the cached value: stored, then as last written";
+      ASSERT_TRUE(ZEPDlgDriver::Click(check));
+      ASSERT_EQ(Hooks(), std::vector<std::string>{hooks[i]});
+      EXPECT_EQ(_script.calls[0].values[0], wasOn ? 0.0 : 1.0);
+      ASSERT_TRUE(windowClose ? ZEPDlgDriver::Close(dialog) : ZEPDlgDriver::CloseDialog(dialog));
+      // Closed but not yet destroyed: its controls no longer reach the hooks.
+      ASSERT_TRUE(ZEPDlgDriver::Click(check));
+      EXPECT_EQ(_script.calls.size(), 1u);
+      ZEPDlgDriver::Idle();
+      EXPECT_EQ(DialogsNamed(kDialogs[i][1]), 0);
+    }
+  }
+  // A fresh dialog shows the value written from the previous one.
+  ZEPDlgDialog* dialog = OpenDialog("cstTypesPushButton", "geoTypeCst");
+  EXPECT_EQ(
+      ZEPSysDynamicCast<ZEPDlgCheckButton>(ZEPDlgDriver::FindControl(dialog, "checkCstVisuSym"))
+          ->GetState(),
+      ZEPDlgChecked);
+  EXPECT_EQ(ZEPCheckLog::Count(), 0);
+}
+
+TEST_F(GeoPage, LockedSettingsInsideADialogStayLocked) {
+  _script.allInfoSet = true;
+  _script.locked = {"DragSolveMode", "CstVisuPerpen"};
+  _script.values = {{"AllowGeomManip", {1}}, {"DisplayCst", {1}}};
+  Open();
+  ZEPDlgDialog* drag = OpenDialog("dragOptionPushButton", "geoAllowGeomManip");
+  ZEPDialog* frame = ZEPDlgDriver::Find(drag, "frameDragMode");
+  ASSERT_NE(frame, nullptr);
+  EXPECT_FALSE(ZEPDlgDriver::Click(Radio("radioDragModeRel")));
+  EXPECT_TRUE(ZEPDlgDriver::Click(Control("checkDragWithEndPts")));
+  ZEPDlgDialog* types = OpenDialog("cstTypesPushButton", "geoTypeCst");
+  EXPECT_FALSE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(types, "checkCstVisuPerpen")));
+  EXPECT_TRUE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(types, "checkCstVisuPara")));
+  EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysDragWithEndPts", "SetSysCstVisuPara"}));
+}
