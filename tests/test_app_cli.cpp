@@ -362,8 +362,13 @@ TEST_F(AppCli, RenderIsOneSelfContainedDialog) {
     EXPECT_NE(html.find(">" + p.title + "<"), std::string::npos) << p.title;
   for (const std::string& title : CatalogTitles())
     EXPECT_NE(html.find(EscapeHtml(title)), std::string::npos) << title;
-  // A padlock beside every lock-aware control (and two in the legend); disabled ones greyed.
-  EXPECT_EQ(Count(html, "class=\"padlock "), AppSettings().size() + 2);
+  // A padlock beside every lock-aware control of each page and its dialogs (a page embedded in
+  // another shows its padlocks there too), and two in the legend; disabled ones greyed.
+  std::size_t padlocks = 2;
+  for (const ZEPAppPage& p : AppPages())
+    for (const ZEPAppSetting& s : AppSettings())
+      padlocks += p.Shows(s) ? 1 : 0;
+  EXPECT_EQ(Count(html, "class=\"padlock "), padlocks);
   EXPECT_NE(html.find("class=\"spinner disabled\" data-name=\"editorGridSpacingV_dialog\""),
             std::string::npos);
   EXPECT_NE(html.find("class=\"check on disabled\" data-name=\"checkGrid_dialog\""),
@@ -415,4 +420,69 @@ TEST_F(AppCli, BinarySetGetLockAndRender) {
   EXPECT_NE(ReadBytes(_dir / "out.html")
                 .find("class=\"padlock locked\" data-name=\"" + spacing->control + "Lock\""),
             std::string::npos);
+}
+
+TEST_F(AppCli, SubDialogControlsAreSetThroughTheirDialog) {
+  // A radio group by its text, its line number or a radio's name; checks of the other dialogs.
+  Result drag = Run({"set", "geometry", "frameDragMode", "relaxation"});
+  ASSERT_EQ(drag.code, kExitOk) << drag.err;
+  EXPECT_EQ(drag.out, "Solving mode: Relaxation\n");
+  EXPECT_EQ(Stored("DrwSketcherGeneral", "Drw_settings_DragModeR14"), std::vector<double>{2});
+  EXPECT_EQ(Run({"set", "geometry", "frameDragMode", "radioDragModeStd"}).code, kExitOk);
+  EXPECT_EQ(Run({"get", "geometry", "frameDragMode"}).out, "Standard mode\n");
+  EXPECT_EQ(Run({"set", "geometry", "frameDragMode", "3"}).code, kExitOk); // the third choice
+  EXPECT_EQ(Run({"set", "geometry", "checkSmartPickHoriVerti", "off"}).code, kExitOk);
+  EXPECT_EQ(Run({"set", "geometry", "checkCstVisuSym", "off"}).code, kExitOk);
+  EXPECT_EQ(Stored("DrwSketcherGeneral", "Drw_settings_CpltDirHorVert"), std::vector<double>{0});
+  EXPECT_EQ(Stored("DraftingOptions", "DrwGeoCstVisuSym"), std::vector<double>{0});
+  // The sketcher reads what the geometry page wrote.
+  const std::string sketcher = Run({"sketcher"}).out;
+  EXPECT_TRUE(std::regex_search(sketcher, std::regex(R"(mode\s+2\n)"))) << sketcher;
+  EXPECT_TRUE(std::regex_search(sketcher, std::regex(R"(horizontal/vertical direction\s+off)")))
+      << sketcher;
+  // show lists the dialog's controls under it.
+  const std::string shown = Run({"show", "geometry"}).out;
+  const auto dialog = shown.find("Solving Mode (dialog of \"Solving Mode...\")");
+  ASSERT_NE(dialog, std::string::npos) << shown;
+  EXPECT_GT(shown.find("frameDragMode"), dialog);
+  EXPECT_NE(shown.find("Relaxation"), std::string::npos);
+
+  Result bad = Run({"set", "geometry", "frameDragMode", "fastest"});
+  EXPECT_EQ(bad.code, kExitBadValue);
+  EXPECT_NE(bad.err.find("3  Relaxation"), std::string::npos) << bad.err;
+  Result push = Run({"set", "geometry", "dragOptionPushButton", "on"});
+  EXPECT_EQ(push.code, kExitUsage);
+  EXPECT_NE(push.err.find("opens a dialog"), std::string::npos) << push.err;
+}
+
+TEST_F(AppCli, SubDialogsFollowTheirButtonAndTheirLocks) {
+  ASSERT_EQ(Run({"set", "geometry", "checkGeomDrag", "off"}).code, kExitOk);
+  Result closed = Run({"set", "geometry", "checkDragWithEndPts", "off"});
+  EXPECT_EQ(closed.code, kExitUsage);
+  EXPECT_NE(
+      closed.err.find("\"Solving Mode...\" is disabled while \"Allow direct manipulation\" is off"),
+      std::string::npos)
+      << closed.err;
+  ASSERT_EQ(Run({"set", "geometry", "checkGeomDrag", "on"}).code, kExitOk);
+  ASSERT_EQ(Run({"lock", "Drw_settings_DragModeR14"}).code, kExitOk);
+  Result locked = Run({"set", "geometry", "frameDragMode", "relaxation"});
+  EXPECT_EQ(locked.code, kExitRefused);
+  EXPECT_NE(locked.err.find("\"Solving mode\" is locked"), std::string::npos) << locked.err;
+  EXPECT_EQ(Run({"set", "geometry", "checkDragWithEndPts", "off"}).code, kExitOk);
+  // The reference size and colour follow "Display constraints".
+  ASSERT_EQ(Run({"set", "geometry", "checkCstVisu", "off"}).code, kExitOk);
+  Result colour = Run({"set", "geometry", "comboCstColor", "red"});
+  EXPECT_EQ(colour.code, kExitRefused);
+  EXPECT_NE(colour.err.find("turn \"Display constraints\" (checkCstVisu) on first"),
+            std::string::npos);
+}
+
+TEST_F(AppCli, GeometryPageShowsTheGridPageSettings) {
+  ASSERT_EQ(Run({"set", "geometry", "editorGridSpacing", "20mm", "--range", "2"}).code, kExitOk);
+  EXPECT_EQ(Shown(Run({"get", "grid", "editorGridSpacing", "--range", "2"}).out),
+            std::make_pair(20.0, std::string("mm")));
+  ASSERT_EQ(Run({"set", "grid", "checkSnap", "off"}).code, kExitOk);
+  EXPECT_EQ(Run({"get", "geometry", "checkSnap"}).out, "off\n");
+  EXPECT_EQ(Run({"reset", "geometry", "checkSnap"}).code, kExitOk);
+  EXPECT_EQ(Run({"get", "grid", "checkSnap"}).out, "on\n");
 }

@@ -95,7 +95,7 @@ public:
 
   // The controls of an opened page showing iRange (0: as it opened).
   int Controls(const ZEPAppPage& iPage, int iRange, std::vector<ZEPAppControl>& oControls) {
-    oControls = PageControls(Open(iPage));
+    oControls = PageControls(Open(iPage), iPage.dialogButtons);
     if (iRange == 0) return kExitOk;
     if (ShownRange(oControls) == 0) {
       _err << "error: --range applies to the grid page only\n";
@@ -108,8 +108,8 @@ public:
 
   // Loads the files, then finds the request's page (showing its range) and, when asked, its
   // control; a non-zero exit code after reporting what was wrong.
-  int Target(const Request& iRequest, bool iWrites, const ZEPAppPage*& oPage, std::vector<ZEPAppControl>& oControls,
-             const ZEPAppControl** oControl) {
+  int Target(const Request& iRequest, bool iWrites, const ZEPAppPage*& oPage,
+             std::vector<ZEPAppControl>& oControls, const ZEPAppControl** oControl) {
     if (int rc = Start(iRequest, iWrites)) return rc;
     oPage = Page(iRequest.page);
     if (!oPage) return kExitUsage;
@@ -129,6 +129,10 @@ public:
       width = std::max(width, c.name.size());
     for (const ZEPAppControl& c : iControls)
       _err << "  " << Pad(c.name, width) << "  " << c.Title() << "\n";
+    for (const ZEPAppControl& c : iControls)
+      if (c.Kind() == ZEPAppKind::Push && c.Disabled())
+        _err << "the controls of the dialog of " << Quoted(c.Title())
+             << " are not listed: " << WhyRefused(iControls, c) << "\n";
     return nullptr;
   }
 
@@ -152,6 +156,7 @@ public:
         if (!section.empty()) _out << "  " << section << "\n";
       }
       std::string marks;
+      if (c.Kind() == ZEPAppKind::Push) marks += "  (button: opens a dialog)";
       if (c.Locked())
         marks += "  \xF0\x9F\x94\x92 " + c.LockText();
       else if (c.Disabled())
@@ -237,10 +242,10 @@ int Get(const Request& iRequest, std::ostream& out, std::ostream& err) {
 }
 
 // The stored setting behind a control, from the settings table; null for a control that only
-// changes what the page shows (the scale range).
+// changes what the page shows (the scale range, a push button).
 const ZEPAppSetting* SettingOf(const ZEPAppPage& iPage, const ZEPAppControl& iControl) {
   for (const ZEPAppSetting& s : AppSettings())
-    if (s.page == iPage.table && s.control == iControl.name) return &s;
+    if (iPage.Shows(s) && s.control == iControl.name) return &s;
   return nullptr;
 }
 
@@ -251,6 +256,8 @@ int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
   const ZEPAppControl* control = nullptr;
   if (int rc = session.Target(iRequest, true, page, controls, &control)) return rc;
   const ZEPAppOutcome outcome = OperateControl(controls, *control, iRequest.value);
+  const int range = ShownRange(controls);
+  CloseSubDialog(*control); // as the user closes the dialog the change was made in
   if (outcome.code != kExitOk) {
     err << "error: " << outcome.message << "\nnothing was changed\n";
     return outcome.code;
@@ -261,9 +268,8 @@ int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
   }
   out << outcome.message;
   const ZEPAppSetting* setting = SettingOf(*page, *control);
-  if (setting && setting->defaults.size() > 1 && ShownRange(controls))
-    out << "  (scale range " << ShownRange(controls) << ": " << ScaleName(ShownRange(controls))
-        << ")";
+  if (setting && setting->defaults.size() > 1 && range)
+    out << "  (scale range " << range << ": " << ScaleName(range) << ")";
   if (!setting) out << "  (only for this run: it stores nothing; --range N chooses a range)";
   out << "\n";
   return kExitOk;
@@ -319,7 +325,7 @@ int Reset(const Request& iRequest, std::ostream& out, std::ostream& err) {
     err << "error: " << session.File().LastError() << "\n";
     return kExitFile;
   }
-  controls = PageControls(session.Open(*page, true)); // shows the default now
+  controls = PageControls(session.Open(*page, true), page->dialogButtons); // shows the default now
   const ZEPAppControl* shown = FindPageControl(controls, name);
   out << title << ": " << (shown ? shown->Shown() : "") << " (default";
   if (setting->defaults.size() > 1) out << ", every scale range";
@@ -368,7 +374,7 @@ int LockOrUnlock(const Request& iRequest, bool iLock, std::ostream& out, std::os
   std::string shown;
   for (const ZEPAppPage& p : AppPages())
     if (p.table == setting->page) {
-      const std::vector<ZEPAppControl> controls = PageControls(session.Open(p));
+      const std::vector<ZEPAppControl> controls = PageControls(session.Open(p), p.dialogButtons);
       if (const ZEPAppControl* c = FindPageControl(controls, setting->control))
         shown = c->Title() + " (" + p.name + " " + c->name + ") = " + c->Shown();
     }
@@ -393,14 +399,19 @@ int Render(const Request& iRequest, std::ostream& out, std::ostream& err) {
   std::vector<ZEPAppRenderPage> rendered;
   bool ranged = false;
   for (const ZEPAppPage* page : pages) {
-    std::vector<ZEPAppControl> controls = PageControls(session.Open(*page));
+    std::vector<ZEPAppControl> controls;
+    if (int rc = session.Controls(*page, 0, controls)) return rc;
     std::string note;
     if (ShownRange(controls)) {
       if (int rc = session.Controls(*page, iRequest.range, controls)) return rc;
       ranged = true;
       note = "Spacing and graduations of the " + ScaleName(ShownRange(controls)) + " scale range";
     }
-    rendered.push_back({page->name, page->title, session.Open(*page), note});
+    ZEPAppRenderPage shown{page->name, page->title, session.Open(*page), note, {}};
+    for (const ZEPAppControl& c : controls)
+      if (c.opener && (shown.dialogs.empty() || shown.dialogs.back().dialog != c.subDialog))
+        shown.dialogs.push_back({c.opener, c.subDialog});
+    rendered.push_back(shown);
   }
   if (iRequest.range && !ranged) {
     err << "error: --range applies to the grid page only\n";

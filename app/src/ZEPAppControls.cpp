@@ -119,17 +119,49 @@ const ZEPAppControl* RangeControl(const std::vector<ZEPAppControl>& iControls) {
   return nullptr;
 }
 
-// Controls that their page enables only while a check button is on.
+// Controls that their page enables only while a check button is on (or only while it is off);
+// perRange: that check button holds one value per scale range.
 struct Dependency {
   const char* control;
   const char* needs;
+  bool whileOn;
+  bool perRange;
 };
 const Dependency kDependencies[] = {
-    {"editorGridSpacingV", "checkAllowDistortions"},
-    {"editorGridGraduationV", "checkAllowDistortions"},
+    {"editorGridSpacingV", "checkAllowDistortions", true, true},
+    {"editorGridGraduationV", "checkAllowDistortions", true, true},
+    {"dragOptionPushButton", "checkGeomDrag", true, false},
+    {"editorCstRefSize", "checkCstVisu", true, false},
+    {"comboCstColor", "checkCstVisu", true, false},
+    {"cstTypesPushButton", "checkCstVisu", true, false},
+    {"editorDimLinePosValue", "checkDimSketch", false, false},
+    {"checkLineUpAutoFunnel", "checkLineUpCumulVal", true, false},
 };
 
+// The radio buttons of a group frame, in screen order.
+std::vector<ZEPDlgRadioButton*> Radios(ZEPDialog* iGroup) {
+  std::vector<ZEPDlgRadioButton*> radios;
+  if (iGroup)
+    for (ZEPDialog* child : iGroup->GetChildren())
+      if (auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(child)) radios.push_back(radio);
+  return radios;
+}
+
+std::string TitleOf(const ZEPDialog& w) {
+  return w.GetTitle().IsEmpty() ? w.GetOwnName() : w.GetTitle().str();
+}
+
+// What the user picks from: a combo's lines, or the texts of a group's radio buttons.
+std::vector<std::string> Choices(const ZEPAppControl& iControl) {
+  if (const ZEPDlgCombo* combo = PickableCombo(iControl.inner)) return Lines(*combo);
+  std::vector<std::string> texts;
+  for (ZEPDlgRadioButton* radio : Radios(iControl.inner))
+    texts.push_back(TitleOf(*radio));
+  return texts;
+}
+
 void Walk(ZEPDialog* iWidget, std::string iSection, std::vector<ZEPAppControl>& oControls) {
+  if (ZEPSysDynamicCast<ZEPDlgWindow>(iWidget)) return; // a sub-dialog: listed after the page
   if (auto* section = ZEPSysDynamicCast<ZEPDlgToolsOptionsFrame>(iWidget))
     iSection = section->GetTitle().str();
   if (auto* lockAware = dynamic_cast<ZEPDrwLockDialog*>(iWidget)) {
@@ -139,7 +171,8 @@ void Walk(ZEPDialog* iWidget, std::string iSection, std::vector<ZEPAppControl>& 
   }
   if (dynamic_cast<ZEPDrwLockLabel*>(iWidget)) return; // a caption
   const bool operable = PickableCombo(iWidget) || ZEPSysDynamicCast<ZEPDlgSpinner>(iWidget) ||
-                        ZEPSysDynamicCast<ZEPDlgCheckButton>(iWidget);
+                        ZEPSysDynamicCast<ZEPDlgCheckButton>(iWidget) ||
+                        ZEPSysDynamicCast<ZEPDlgPushButton>(iWidget);
   if (operable) {
     if (iWidget->GetVisibility() != ZEPDlgHide)
       oControls.push_back({iWidget->GetOwnName(), iWidget, iWidget, nullptr, iSection});
@@ -156,6 +189,8 @@ ZEPAppKind ZEPAppControl::Kind() const {
   if (ZEPSysDynamicCast<ZEPDlgCheckButton>(inner)) return ZEPAppKind::Check;
   if (ZEPSysDynamicCast<ZEPDlgSpinner>(inner)) return ZEPAppKind::Spinner;
   if (PickableCombo(inner)) return ZEPAppKind::Combo;
+  if (ZEPSysDynamicCast<ZEPDlgPushButton>(inner)) return ZEPAppKind::Push;
+  if (!Radios(inner).empty()) return ZEPAppKind::Choice;
   return ZEPAppKind::Other;
 }
 
@@ -179,6 +214,11 @@ std::string ZEPAppControl::Shown() const {
     if (combo->GetLine(text, combo->GetSelect()) < 0) return "(none)";
     return text.str();
   }
+  case ZEPAppKind::Choice:
+    for (ZEPDlgRadioButton* radio : Radios(inner))
+      if (radio->GetState() == ZEPDlgChecked) return TitleOf(*radio);
+    return "(none)";
+  case ZEPAppKind::Push:
   case ZEPAppKind::Other:
     break;
   }
@@ -217,14 +257,18 @@ std::string ZEPAppControl::Accepts() const {
             (m == Magnitude::Length ? kLengthWords : kAngleWords) + ")";
     return text;
   }
-  case ZEPAppKind::Combo: {
-    const std::vector<std::string> lines = Lines(*PickableCombo(inner));
-    std::string text =
-        "a line number from 1 to " + std::to_string(lines.size()) + " or the text of a line:";
+  case ZEPAppKind::Combo:
+  case ZEPAppKind::Choice: {
+    const std::vector<std::string> lines = Choices(*this);
+    const char* what = Kind() == ZEPAppKind::Combo ? "line" : "choice";
+    std::string text = std::string("a ") + what + " number from 1 to " +
+                       std::to_string(lines.size()) + " or the text of a " + what + ":";
     for (std::size_t i = 0; i < lines.size(); ++i)
       text += "\n  " + std::to_string(i + 1) + "  " + lines[i];
     return text;
   }
+  case ZEPAppKind::Push:
+    return "nothing: it is a button that opens a dialog; set the controls listed under that dialog";
   case ZEPAppKind::Other:
     break;
   }
@@ -232,12 +276,43 @@ std::string ZEPAppControl::Accepts() const {
 }
 
 // ---- a page's controls --------------------------------------------------------------------------
-std::vector<ZEPAppControl> PageControls(ZEPDialog* iPage) {
+std::vector<ZEPAppControl> PageControls(ZEPDialog* iPage,
+                                        const std::vector<std::string>& iDialogButtons) {
   std::vector<ZEPAppControl> controls;
-  if (iPage)
-    for (ZEPDialog* child : iPage->GetChildren())
-      Walk(child, "", controls);
+  if (!iPage) return controls;
+  std::vector<ZEPDialog*> open;
+  for (ZEPDialog* child : iPage->GetChildren())
+    if (ZEPSysDynamicCast<ZEPDlgDialog>(child)) open.push_back(child);
+  for (ZEPDialog* dialog : open)
+    ZEPDlgDriver::CloseDialog(dialog);
+  if (!open.empty()) ZEPDlgDriver::Idle();
+
+  for (ZEPDialog* child : iPage->GetChildren())
+    Walk(child, "", controls);
+  for (const std::string& name : iDialogButtons) {
+    ZEPDialog* button = ZEPDlgDriver::Find(iPage, name);
+    if (!button || !button->IsEffectivelyEnabled()) continue; // its dialog cannot be opened now
+    const std::vector<ZEPDialog*> before = iPage->GetChildren();
+    if (!ZEPDlgDriver::Click(button)) continue;
+    for (ZEPDialog* child : iPage->GetChildren()) {
+      if (!ZEPSysDynamicCast<ZEPDlgDialog>(child) ||
+          std::find(before.begin(), before.end(), child) != before.end())
+        continue;
+      const std::size_t first = controls.size();
+      for (ZEPDialog* grandChild : child->GetChildren())
+        Walk(grandChild, "", controls);
+      for (std::size_t i = first; i < controls.size(); ++i) {
+        controls[i].section = TitleOf(*child) + " (dialog of \"" + TitleOf(*button) + "\")";
+        controls[i].subDialog = child;
+        controls[i].opener = button;
+      }
+    }
+  }
   return controls;
+}
+
+void CloseSubDialog(const ZEPAppControl& iControl) {
+  if (iControl.subDialog) ZEPDlgDriver::CloseDialog(iControl.subDialog);
 }
 
 const ZEPAppControl* FindPageControl(const std::vector<ZEPAppControl>& iControls,
@@ -268,15 +343,17 @@ std::string WhyRefused(const std::vector<ZEPAppControl>& iControls, const ZEPApp
   if (why == "hidden") return title + " is hidden on this page";
   for (const Dependency& d : kDependencies) {
     const ZEPAppControl* needed = d.control == iControl.name ? ByName(iControls, d.needs) : nullptr;
-    if (!needed || needed->Shown() != "off") continue;
-    std::string text = title + " is disabled while " + Quoted(needed->Title()) + " is off";
-    if (int range = ShownRange(iControls)) {
+    const char* blocking = d.whileOn ? "off" : "on";
+    if (!needed || needed->Shown() != blocking) continue;
+    std::string text = title + " is disabled while " + Quoted(needed->Title()) + " is " + blocking;
+    if (int range = d.perRange ? ShownRange(iControls) : 0) {
       ZEPICkeScalesServices_var scales = ZEPGlobalFunctions2::GetScalesServices();
       if (scales)
         text += " for the " + scales->GetScaleName(static_cast<ZEPCkeScale>(range)).str() +
                 " scale range";
     }
-    return text + "; turn " + Quoted(needed->Title()) + " (" + needed->name + ") on first";
+    return text + "; turn " + Quoted(needed->Title()) + " (" + needed->name + ") " +
+           (d.whileOn ? "on" : "off") + " first";
   }
   return title + " is disabled on this page";
 }
@@ -432,10 +509,23 @@ ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls,
     if (!ZEPDlgDriver::Select(iControl.inner, line)) return Refused(iControl);
     return Done(iControl, true);
   }
+  case ZEPAppKind::Choice: {
+    const std::vector<ZEPDlgRadioButton*> radios = Radios(iControl.inner);
+    int choice = FindLine(Choices(iControl), iText);
+    for (std::size_t i = 0; i < radios.size() && choice < 0; ++i)
+      if (Lower(radios[i]->GetOwnName()) == Lower(Trim(iText))) choice = static_cast<int>(i);
+    if (choice < 0) return BadValue(iControl, Quoted(iText) + " is not one of its choices");
+    ZEPDlgRadioButton* radio = radios[static_cast<std::size_t>(choice)];
+    if (radio->GetState() == ZEPDlgChecked) return Done(iControl, false);
+    if (!ZEPDlgDriver::Click(radio)) return Refused(iControl);
+    return Done(iControl, true);
+  }
+  case ZEPAppKind::Push:
   case ZEPAppKind::Other:
     break;
   }
-  return Fail(kExitUsage, Quoted(iControl.Title()) + " cannot be set from the command line");
+  return Fail(kExitUsage,
+              Quoted(iControl.Title()) + " (" + iControl.name + ") takes " + iControl.Accepts());
 }
 
 ZEPAppOutcome SelectRange(const std::vector<ZEPAppControl>& iControls, int iRange) {

@@ -21,16 +21,20 @@ enum ZEPAppExit : int {
   kExitFile = 5,     // a settings file that cannot be read or written
 };
 
-enum class ZEPAppKind { Check, Spinner, Combo, Other };
+// Choice: radio buttons of one group, chosen by their text. Push: a button that opens a
+// sub-dialog; it has no value of its own.
+enum class ZEPAppKind { Check, Spinner, Combo, Choice, Push, Other };
 
 // One control of a page: a lock-aware control, or an operable control without padlock
-// (the grid page's scale range combo).
+// (the grid page's scale range combo, a push button), on the page or in a sub-dialog.
 struct ZEPAppControl {
   std::string name;                      // "editorGridSpacing"
   ZEPDialog* widget = nullptr;           // the widget of that name
   ZEPDialog* inner = nullptr;            // what the user operates
   ZEPDrwLockDialog* lockAware = nullptr; // null without padlock
   std::string section;                   // title of its section
+  ZEPDialog* subDialog = nullptr;        // the sub-dialog it is in; null on the page itself
+  ZEPDialog* opener = nullptr;           // the push button that opened that sub-dialog
 
   ZEPAppKind Kind() const;
   std::string Title() const;
@@ -46,8 +50,15 @@ struct ZEPAppControl {
   std::string Accepts() const;
 };
 
-// Every control of a page, in tree order.
-std::vector<ZEPAppControl> PageControls(ZEPDialog* iPage);
+// Every control of a page, in tree order, then those of each sub-dialog that iDialogButtons
+// open: each button the user can press is pressed through the driver and its dialog stays
+// open. Sub-dialogs opened by an earlier call are closed first, which ends the controls that
+// call answered for them.
+std::vector<ZEPAppControl> PageControls(ZEPDialog* iPage,
+                                        const std::vector<std::string>& iDialogButtons = {});
+// Closes the control's sub-dialog as the user does, when it is in one; the dialog is gone
+// at the next idle time.
+void CloseSubDialog(const ZEPAppControl& iControl);
 // By name; an exact match first, else the only case-insensitive one. Null if none.
 const ZEPAppControl* FindPageControl(const std::vector<ZEPAppControl>& iControls,
                                      const std::string& iName);

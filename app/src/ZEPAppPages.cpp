@@ -1,9 +1,11 @@
 #include "ZEPAppPages.h"
 
 #include "ZEP2DBaseOptGalFrm.h"
+#include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
+#include <algorithm>
 #include <set>
 
 namespace zepapp {
@@ -49,6 +51,22 @@ private:
   ZEPAppBinding _binding{"PrimaryView"};
 };
 
+// The geometry page shows the application's grid page at its top: the same settings as the
+// grid page's, whichever page changes them.
+class GeometryPage : public ZEP2DBaseOptGeoFrm {
+public:
+  explicit GeometryPage(ZEPDialog* iParent) : ZEP2DBaseOptGeoFrm(iParent, "GeometryPage") {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)
+#include "ZEP2DBaseOptGeoFrm.def"
+#undef ZEP_SETTING
+  ZEP2DBaseOptGridFrm* CreateGridFrame() override { return new GridPage(this); }
+
+private:
+  ZEPAppBinding _binding{"Geometry"};
+};
+
 template <class Page> ZEPDlgFrame* Open(ZEPDialog* iParent) {
   auto* page = new Page(iParent);
   page->Build();
@@ -66,16 +84,37 @@ const std::map<std::string, ZEPAppStored> kGeneralStored = {
 const std::map<std::string, ZEPAppStored> kPrimaryViewStored = {
 #include "ZEP2DBasePrimaryViewFrm.def"
 };
+const std::map<std::string, ZEPAppStored> kGeometryStored = {
+#include "ZEP2DBaseOptGeoFrm.def"
+};
 #undef ZEP_SETTING
 } // namespace
 
 const std::vector<ZEPAppPage>& AppPages() {
   static const std::vector<ZEPAppPage> pages = {
-      {"general", "General", "General", &Open<GeneralPage>, kGeneralStored},
-      {"grid", "Grid", "Grid", &Open<GridPage>, kGridStored},
-      {"primary-view", "Primary view", "PrimaryView", &Open<PrimaryViewPage>, kPrimaryViewStored},
+      {"general", "General", "General", &Open<GeneralPage>, kGeneralStored, {}, {}},
+      {"grid", "Grid", "Grid", &Open<GridPage>, kGridStored, {}, {}},
+      {"geometry",
+       "Geometry",
+       "Geometry",
+       &Open<GeometryPage>,
+       kGeometryStored,
+       {"dragOptionPushButton", "smartPickPushButton", "cstTypesPushButton"},
+       {"Grid"}},
+      {"primary-view",
+       "Primary view",
+       "PrimaryView",
+       &Open<PrimaryViewPage>,
+       kPrimaryViewStored,
+       {},
+       {}},
   };
   return pages;
+}
+
+bool ZEPAppPage::Shows(const ZEPAppSetting& iSetting) const {
+  return iSetting.page == table ||
+         std::find(embedded.begin(), embedded.end(), iSetting.page) != embedded.end();
 }
 
 const ZEPAppPage* FindPage(const std::string& iName) {
@@ -86,7 +125,8 @@ const ZEPAppPage* FindPage(const std::string& iName) {
 
 std::vector<std::string> AppRepositories() {
   std::set<std::string> names;
-  for (const ZEPAppSetting& s : AppSettings()) names.insert(s.repository);
+  for (const ZEPAppSetting& s : AppSettings())
+    names.insert(s.repository);
   return {names.begin(), names.end()};
 }
 
@@ -98,7 +138,8 @@ void ApplyDefaults() {
     const ZEPAppPage* page = nullptr;
     for (const ZEPAppPage& p : AppPages())
       if (p.table == s.page) page = &p;
-    auto kind = page ? page->stored.find(s.attribute) : std::map<std::string, ZEPAppStored>::const_iterator();
+    auto kind = page ? page->stored.find(s.attribute)
+                     : std::map<std::string, ZEPAppStored>::const_iterator();
     if (!page || kind == page->stored.end()) continue;
     switch (kind->second) {
     case ZEPAppStored::Int:

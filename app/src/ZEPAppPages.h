@@ -11,13 +11,20 @@
 namespace zepapp {
 
 struct ZEPAppPage {
-  std::string name;     // command-line name: "grid"
-  std::string title;    // "Grid"
-  std::string table;    // the page's name in ZEPAppSettings.def: "Grid"
+  std::string name;  // command-line name: "grid"
+  std::string title; // "Grid"
+  std::string table; // the page's name in ZEPAppSettings.def: "Grid"
   // Constructs the page on iParent, builds and initialises it.
   std::function<ZEPDlgFrame*(ZEPDialog* iParent)> open;
   // How each attribute of the page is stored, from the page's table.
   std::map<std::string, ZEPAppStored> stored;
+  // The push buttons that open sub-dialogs, in screen order.
+  std::vector<std::string> dialogButtons;
+  // Pages embedded in this one, by table name: their controls keep their own settings.
+  std::vector<std::string> embedded;
+
+  // Whether a row of ZEPAppSettings.def belongs to a control shown on this page.
+  bool Shows(const ZEPAppSetting& iSetting) const;
 };
 
 const std::vector<ZEPAppPage>& AppPages();

@@ -95,6 +95,15 @@ fieldset.section legend{padding:0 6px;font-weight:600;color:#203656}
 .footer code{font-family:"DejaVu Sans Mono",Consolas,monospace;font-size:11px;background:#e0e4e9;padding:0 4px;border-radius:3px}
 .buttons{display:flex;justify-content:flex-end;gap:8px;padding:0 14px 12px}
 .buttons span{min-width:74px;text-align:center}
+fieldset.radios{margin:0;padding:2px 8px 6px;border:1px solid #c7cdd5;border-radius:3px}
+fieldset.radios legend{padding:0 4px;color:#203656}
+a.push{color:inherit;text-decoration:none;cursor:pointer}
+.push.disabled{pointer-events:none}
+.subdialog{display:none;position:fixed;inset:0;z-index:10;background:rgba(20,30,45,.35);align-items:center;justify-content:center}
+.subdialog:target{display:flex}
+.subbox{min-width:320px;max-width:92vw;max-height:92vh;overflow:auto;background:#eceef1;border:1px solid #2f3b4c;border-radius:6px;box-shadow:0 10px 30px rgba(0,0,0,.45)}
+.subbox .pagegrid{padding:10px 14px}
+.titlebar a.close{color:#fff;text-decoration:none}
 @media print{.page{display:block;margin-bottom:18px}.tabs{display:none}body{background:#fff}}
 )CSS";
 
@@ -127,11 +136,28 @@ std::string Tooltip(const ZEPDialog& w) {
   return !w.GetLongHelp().IsEmpty() ? w.GetLongHelp().str() : w.GetShortHelp().str();
 }
 
-void Render(const ZEPDialog& w, std::string& out);
+void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out);
 
-void Children(const ZEPDialog& w, std::string& out) {
+void Children(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out) {
   for (const ZEPDialog* child : w.GetChildren())
-    Render(*child, out);
+    Render(*child, iPage, out);
+}
+
+std::string DialogId(const ZEPAppRenderPage& iPage, const ZEPDialog& iDialog) {
+  return "dlg-" + iPage.name + "-" + iDialog.GetOwnName();
+}
+
+// A sub-dialog: a box of its own over the page, shown while its id is the address's fragment.
+void RenderDialog(const ZEPAppRenderPage& iPage, const ZEPDialog& iDialog, std::string& out) {
+  const std::string title =
+      EscapeHtml(iDialog.GetTitle().IsEmpty() ? iDialog.GetOwnName() : iDialog.GetTitle().str());
+  out += "<div class=\"subdialog\" id=\"" + EscapeHtml(DialogId(iPage, iDialog)) +
+         "\" role=\"dialog\" aria-label=\"" + title +
+         "\"><div class=\"subbox\"><div class=\"titlebar\"><span class=\"icon\"></span>" + title +
+         "<a class=\"close\" href=\"#\" aria-label=\"Close\">&#10005;</a></div><div "
+         "class=\"pagegrid\">";
+  Children(iDialog, iPage, out);
+  out += "</div><div class=\"buttons\"><a class=\"push\" href=\"#\">Close</a></div></div></div>\n";
 }
 
 void RenderCombo(const ZEPDialog& w, const ZEPDlgCombo& combo, std::string& out) {
@@ -150,8 +176,9 @@ void RenderCombo(const ZEPDialog& w, const ZEPDlgCombo& combo, std::string& out)
          "</span><span class=\"drop\">&#9660;</span></span>";
 }
 
-void Render(const ZEPDialog& w, std::string& out) {
+void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out) {
   auto* self = const_cast<ZEPDialog*>(&w);
+  if (ZEPSysDynamicCast<ZEPDlgWindow>(self)) return; // a sub-dialog: drawn after the page
   if (auto* lock = ZEPSysDynamicCast<ZEPDlgLock>(self)) {
     const bool locked = lock->IsLocked();
     std::string tip =
@@ -167,7 +194,7 @@ void Render(const ZEPDialog& w, std::string& out) {
            EscapeHtml(section->GetTitle().str()) + "</legend>";
     for (const ZEPDialog* child : w.GetChildren()) {
       out += "<div class=\"grid\">";
-      Children(*child, out); // the options frame's controls
+      Children(*child, iPage, out); // the options frame's controls
       out += "</div>";
     }
     out += "</fieldset>";
@@ -209,6 +236,12 @@ void Render(const ZEPDialog& w, std::string& out) {
     return;
   }
   if (ZEPSysDynamicCast<ZEPDlgPushButton>(self)) {
+    for (const ZEPAppRenderDialog& d : iPage.dialogs)
+      if (d.opener == &w && d.dialog) {
+        out += "<a href=\"#" + EscapeHtml(DialogId(iPage, *d.dialog)) + "\"" +
+               Attributes(w, "push", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) + "</a>";
+        return;
+      }
     out += "<span" + Attributes(w, "push", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) +
            "</span>";
     return;
@@ -224,8 +257,18 @@ void Render(const ZEPDialog& w, std::string& out) {
     hasLock = hasLock || ZEPSysDynamicCast<ZEPDlgLock>(const_cast<ZEPDialog*>(child)) ||
               (ZEPSysDynamicCast<ZEPDlgCheckButton>(const_cast<ZEPDialog*>(child)) &&
                child->GetVisibility() == ZEPDlgHide);
+  bool radios = false;
+  for (const ZEPDialog* child : w.GetChildren())
+    radios = radios || ZEPSysDynamicCast<ZEPDlgRadioButton>(const_cast<ZEPDialog*>(child));
+  if (radios && !w.GetTitle().IsEmpty()) { // a radio group under its caption
+    out += "<fieldset" + Attributes(w, "grid radios", Tooltip(w)) + "><legend>" +
+           EscapeHtml(w.GetTitle().str()) + "</legend>";
+    Children(w, iPage, out);
+    out += "</fieldset>";
+    return;
+  }
   out += "<div" + Attributes(w, hasLock ? "lockable" : "grid", "") + ">";
-  Children(w, out);
+  Children(w, iPage, out);
   out += "</div>";
 }
 
@@ -266,9 +309,11 @@ std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages,
     if (!p.note.empty()) out += "<p class=\"note\">" + EscapeHtml(p.note) + "</p>\n";
     if (p.frame) {
       out += "<div class=\"pagegrid\">";
-      Children(*p.frame, out);
+      Children(*p.frame, p, out);
       out += "</div>\n";
     }
+    for (const ZEPAppRenderDialog& d : p.dialogs)
+      if (d.dialog) RenderDialog(p, *d.dialog, out);
     out += "</section>\n";
   }
   out += "</div>\n</div>\n<div class=\"footer\">";

@@ -9,11 +9,19 @@
 
 namespace zepapp {
 
+// A sub-dialog of a page, open, and the push button that opens it.
+struct ZEPAppRenderDialog {
+  const ZEPDialog* opener = nullptr;
+  const ZEPDialog* dialog = nullptr;
+};
+
 struct ZEPAppRenderPage {
   std::string name;                 // "grid": anchors and tab ids
   std::string title;                // "Grid"
   const ZEPDialog* frame = nullptr; // the opened page
   std::string note;                 // a line under the page heading; may be empty
+  // Drawn as dialogs of their own that their push buttons open.
+  std::vector<ZEPAppRenderDialog> dialogs;
 };
 
 struct ZEPAppRenderContext {
