@@ -1,5 +1,6 @@
 // Page costs: building and initialising each page, and one user change reaching its hook.
 #include "ZEP2DBaseOptGalFrm.h"
+#include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
@@ -31,6 +32,12 @@ struct PrimaryViewPage : ZEP2DBasePrimaryViewFrm {
   ZEPString GetFrameIconName() override { return "I_PrimaryView"; }
 #include "ZEP2DBasePrimaryViewFrm.def"
 };
+struct GeoPage : ZEP2DBaseOptGeoFrm {
+  explicit GeoPage(ZEPDialog* iParent) : ZEP2DBaseOptGeoFrm(iParent, "GeometryPage") {}
+  long _writes = 0;
+  ZEP2DBaseOptGridFrm* CreateGridFrame() override { return new GridPage(this); }
+#include "ZEP2DBaseOptGeoFrm.def"
+};
 #undef ZEP_SETTING
 
 template <class Page> void BuildAndInitialize(benchmark::State& state) {
@@ -58,6 +65,25 @@ template <class Page> void ClickToHook(benchmark::State& state, const char* iCon
 BENCHMARK_TEMPLATE(BuildAndInitialize, GridPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, GalPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, PrimaryViewPage);
+BENCHMARK_TEMPLATE(BuildAndInitialize, GeoPage);
+
+// A sub-dialog as the user goes through it: press its button, tick a check, close it.
+void GeoSubDialogRoundTrip(benchmark::State& state) {
+  ZEPDlgWindow root(nullptr, "root", 0);
+  auto* page = new GeoPage(&root);
+  page->Build();
+  page->Initialize();
+  ZEPDialog* button = ZEPDlgDriver::Find(page, "smartPickPushButton");
+  for (auto _ : state) {
+    ZEPDlgDriver::Click(button);
+    ZEPDialog* dialog = ZEPDlgDriver::Find(page, "geoSmartPick");
+    ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(dialog, "checkSmartPickHoriVerti"));
+    ZEPDlgDriver::CloseDialog(dialog);
+    ZEPDlgDriver::Idle();
+  }
+  if (page->_writes != static_cast<long>(state.iterations())) state.SkipWithError("a click did not reach its hook");
+}
+BENCHMARK(GeoSubDialogRoundTrip);
 void GridClickSnap(benchmark::State& state) { ClickToHook<GridPage>(state, "checkSnap"); }
 void GalClickViewFrame(benchmark::State& state) { ClickToHook<GalPage>(state, "checkViewFrame"); }
 void PrimaryViewClickResize(benchmark::State& state) { ClickToHook<PrimaryViewPage>(state, "chkResizeViewBoxOn3D"); }
