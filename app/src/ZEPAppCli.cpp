@@ -471,7 +471,7 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
   set->add_option(
          "value", r.value,
          "on/off for a check box; a number with an optional unit (25mm, 2.5cm, 1in, 15deg) for a "
-         "spinner; a line number from 1 or a line's text for a combo")
+         "spinner; a line number from 1 or a line's text for a combo or a group of radio buttons")
       ->required();
   rangeOption(set);
   CLI::App* reset =
