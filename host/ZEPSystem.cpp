@@ -3,6 +3,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <filesystem>
 #include <fstream>
 #include <map>
 #include <memory>
@@ -193,13 +194,40 @@ const Catalog& GetCatalog(const std::string& iName) {
 }
 } // namespace
 
+namespace {
+bool HasCatalogs(const std::string& iDir) {
+  std::error_code ec;
+  return !iDir.empty() && std::filesystem::is_directory(iDir + "/catalogs", ec);
+}
+
+// The folder of the running program; empty when it cannot be told.
+std::string ProgramDir() {
+  std::error_code ec;
+  const std::filesystem::path exe = std::filesystem::read_symlink("/proc/self/exe", ec);
+  return ec ? std::string() : exe.parent_path().string();
+}
+} // namespace
+
+// ZEP_RESOURCES when set; else the first folder that holds catalogs: beside an installed program
+// (<prefix>/bin/../share/drafting-options), the source tree the host was built from, the
+// installation folder it was configured for. Looked up once.
 std::string ZEPMsgCatalog::ResourceDir() {
   if (const char* env = ZEPGetEnv("ZEP_RESOURCES")) return env;
+  static const std::string found = [] {
+    std::vector<std::string> candidates;
+    const std::string program = ProgramDir();
+    if (!program.empty()) candidates.push_back(program + "/../share/drafting-options");
 #ifdef ZEP_RESOURCE_DIR
-  return ZEP_RESOURCE_DIR;
-#else
-  return "resources";
+    candidates.push_back(ZEP_RESOURCE_DIR);
 #endif
+#ifdef ZEP_INSTALL_RESOURCE_DIR
+    candidates.push_back(ZEP_INSTALL_RESOURCE_DIR);
+#endif
+    for (const std::string& dir : candidates)
+      if (HasCatalogs(dir)) return std::filesystem::path(dir).lexically_normal().string();
+    return candidates.empty() ? std::string("resources") : candidates.back();
+  }();
+  return found;
 }
 
 void ZEPMsgCatalog::Reset() { Catalogs().clear(); }

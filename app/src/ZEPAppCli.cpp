@@ -442,7 +442,8 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
       kAppName};
   app.fallthrough(); // global options also after the command
   app.require_subcommand(0, 1);
-  app.set_version_flag("--version", std::string(kAppName) + " " + kAppVersion);
+  app.set_version_flag("--version", std::string(kAppName) + " " + kAppVersion +
+                                        "\nresources: " + ZEPMsgCatalog::ResourceDir());
   Request r;
   app.add_option("--settings", r.settings,
                  "The user's settings file (default: $" + std::string(kSettingsFileEnv) +
@@ -520,6 +521,14 @@ void CloseRepositories() {
 int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& err) {
   CloseRepositories();
   int rc = kExitFailure;
+  // Without its catalogs every page would show without a single text: stop at once.
+  std::error_code ec;
+  const std::string resources = ZEPMsgCatalog::ResourceDir();
+  if (!std::filesystem::is_directory(resources + "/catalogs", ec)) {
+    err << "error: the message catalogs are missing: no folder " << resources
+        << "/catalogs (ZEP_RESOURCES names the resources folder)\n";
+    return kExitFailure;
+  }
   try {
     rc = Run(argc, argv, out, err);
   } catch (const std::exception& ex) {
