@@ -65,3 +65,26 @@ template <class Page> Page* OpenPage(HookScript& iScript, ZEPDialog* iParent) {
   page->Initialize();
   return page;
 }
+
+#include "ZEP2DBaseOptDimFrm.h"
+
+// The dimension page; its layout options answer from the script, else as the module does.
+class RecordingDimPage : public Recording<ZEP2DBaseOptDimFrm> {
+public:
+  RecordingDimPage(HookScript& iScript, ZEPDialog* iParent)
+      : Recording<ZEP2DBaseOptDimFrm>(iScript, iParent, "DimensionPage") {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptDimFrm, Name, Kind)
+#include "ZEP2DBaseOptDimFrm.def"
+#undef ZEP_SETTING
+  unsigned char WithFrmCreateDriveAndChamfer() override {
+    return _script.Option("WithFrmCreateDriveAndChamfer", ZEP2DBaseOptDimFrm::WithFrmCreateDriveAndChamfer()) != 0;
+  }
+  unsigned char WithLineUpValues() override {
+    return _script.Option("WithLineUpValues", ZEP2DBaseOptDimFrm::WithLineUpValues()) != 0;
+  }
+  unsigned char WithFrmDimOrigin() override {
+    return _script.Option("WithFrmDimOrigin", ZEP2DBaseOptDimFrm::WithFrmDimOrigin()) != 0;
+  }
+};

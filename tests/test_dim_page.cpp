@@ -1,0 +1,466 @@
+// Dimension page: optional controls and layout options, radios written on change, the follow
+// cursor and cumulated value rules, paper lengths and angles, the 3D associativity dialog and the
+// page's registration with the object model.
+#include "RecordingPages.h"
+
+#include "ZEPDrwLockCheckButton.h"
+#include "ZEPDrwLockSpinner.h"
+
+#include <cmath>
+
+namespace {
+class DimPage : public ZEPHostTest {
+protected:
+  // Paper lengths read their unit from the drafting options, as in the application.
+  void SetUp() override {
+    ZEPHostTest::SetUp();
+    _pOptions = ZEPSysSettingRepository::Open("DraftingOptions");
+  }
+  // In normal use the page reports no failed check.
+  void TearDown() override {
+    for (const ZEPCheckEntry& e : ZEPCheckLog::Entries())
+      ADD_FAILURE() << "check: " << e.expression;
+    ZEPHostTest::TearDown();
+  }
+
+  // A fresh page in a window of its own; the previous one goes with its window.
+  RecordingDimPage* Open() {
+    delete _pWindow;
+    _pWindow = new ZEPDlgWindow(&_root, "window", 0);
+    return _pPage = OpenPage<RecordingDimPage>(_script, _pWindow);
+  }
+  ZEPDialog* Find(const char* iName) { return ZEPDlgDriver::Find(_pPage, iName); }
+  ZEPDialog* Control(const char* iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
+  ZEPDlgCheckButton* Check(const char* iName) {
+    return ZEPSysDynamicCast<ZEPDlgCheckButton>(Control(iName));
+  }
+  ZEPDlgSpinner* Spinner(const char* iName) {
+    return ZEPSysDynamicCast<ZEPDlgSpinner>(Control(iName));
+  }
+  ZEPDlgRadioButton* Radio(const char* iName) {
+    return ZEPSysDynamicCast<ZEPDlgRadioButton>(Find(iName));
+  }
+  bool Checked(const char* iName) {
+    if (ZEPDlgRadioButton* radio = Radio(iName)) return radio->GetState() == ZEPDlgChecked;
+    return Check(iName)->GetState() == ZEPDlgChecked;
+  }
+  short Row(const char* iName) { return Find(iName)->GetGridConstraints().row; }
+
+  // The radio of a group that is on.
+  std::string Selected(const std::vector<const char*>& iRadios) {
+    std::string on;
+    for (const char* name : iRadios)
+      if (Checked(name)) on += on.empty() ? name : std::string("+") + name;
+    return on;
+  }
+  std::vector<double> Written(const char* iHook) {
+    std::vector<double> values;
+    for (const HookCall& call : _script.Calls(iHook))
+      values.push_back(call.values.at(0));
+    return values;
+  }
+
+  // The 3D associativity dialog, searched among the page's own children (a section of the page
+  // has the same name as the dialog's first section).
+  std::vector<ZEPDlgDialog*> Dialogs() {
+    std::vector<ZEPDlgDialog*> dialogs;
+    for (ZEPDialog* child : _pPage->GetChildren())
+      if (auto* d = ZEPSysDynamicCast<ZEPDlgDialog>(child))
+        if (d->GetOwnName() == "dimAssocWnd") dialogs.push_back(d);
+    return dialogs;
+  }
+  ZEPDlgDialog* PushAssoc3D() {
+    EXPECT_TRUE(ZEPDlgDriver::Click(Find("pushAssoc3D")));
+    std::vector<ZEPDlgDialog*> dialogs = Dialogs();
+    return dialogs.empty() ? nullptr : dialogs.back();
+  }
+  static ZEPDlgRadioButton* RadioIn(ZEPDialog* iDialog, const char* iName) {
+    return ZEPSysDynamicCast<ZEPDlgRadioButton>(ZEPDlgDriver::Find(iDialog, iName));
+  }
+
+  HookScript _script;
+  ZEPSysSettingRepository* _pOptions = nullptr;
+  ZEPDlgWindow* _pWindow = nullptr;
+  RecordingDimPage* _pPage = nullptr;
+};
+
+const double kPi = std::acos(-1.0);
+const std::vector<const char*> kCircle = {"_radioDimCircleCenter", "_radioDimCircleEdge"};
+const std::vector<const char*> kForce2D = {"_radioDimForce2DAlways", "_radioDimForce2DWhenPb",
+                                           "_radioDimForce2DNever"};
+} // namespace
+
+TEST_F(DimPage, ModuleHooksOnly) {
+  Open();
+  EXPECT_EQ(Selected(kCircle), "_radioDimCircleCenter");
+  EXPECT_TRUE(Spinner("editorDimLinePosValue")->IsEffectivelyEnabled());
+  // Optional controls the module's hooks leave out, and the origin section that is off by default.
+  for (const char* name : {"pushAssoc3D", "frameDimAssoc3D", "tmpFrame", "checkLineUpAutoFunnel",
+                           "frmDimOriented", "chkDimOriginSymb"})
+    EXPECT_EQ(Find(name), nullptr) << name;
+  EXPECT_NE(Find("checkDimDriveAuto"), nullptr);
+  EXPECT_EQ(Row("frameDimSketch"), 0);
+  EXPECT_EQ(Row("_frameMove"), 1);
+  EXPECT_EQ(Row("_frameLineUp"), 2);
+  EXPECT_EQ(Row("frm"), 4);
+  // The approximate flag is read after the line-up values.
+  EXPECT_EQ(_script.reads,
+            (std::vector<std::string>{
+                "DimFollowMouse", "DimConstantOffset", "DimConstantOffsetValue", "DimAssoc3DMod",
+                "DimCreateDrive", "DimDetectChamfer", "DimCreateCircle",
+                "DimActivateSnapBetSymbols", "DimMoveSubPart", "DimOffsetRefMM", "DimOffsetRefDeg",
+                "DimOffsetBetMM", "DimOffsetBetDeg", "DimAlignStackValue", "DimAlignCumulValue",
+                "DimCumulAddFunnel", "AssocDimOnApproximate", "DimOriginSymb"}));
+  EXPECT_EQ(_pPage->GetResourceFilename(0), "ZEP2DBaseOptDimFrm");
+  EXPECT_EQ(_pPage->GetResourceFilename(1), _pPage->ZEPDlgFrame::GetResourceFilename(0));
+  EXPECT_TRUE(_script.calls.empty());
+  ExpectGolden("dim_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
+}
+
+TEST_F(DimPage, AllInfoHooksAnsweringZeroWithEveryLayoutOption) {
+  _script.allInfoSet = true;
+  _script.options = {
+      {"WithFrmCreateDriveAndChamfer", 1}, {"WithLineUpValues", 1}, {"WithFrmDimOrigin", 1}};
+  _script.values = {
+      {"DimConstantOffsetValue", {12.5}}, {"DimAssoc3DMod", {1}},    {"AssocDimOnApproximate", {1}},
+      {"DimCreateCircle", {1}},           {"DimOffsetRefDeg", {90}}, {"DimAlignCumulValue", {1}},
+      {"DimCumulAddFunnel", {1}},         {"DimOriginSymb", {1}},    {"DimOffsetBetMM", {-4}}};
+  Open();
+  ExpectGolden("dim_page_info_zero.dump", ZEPDlgDriver::Dump(_pPage));
+  ZEPDlgDialog* dialog = PushAssoc3D();
+  ASSERT_NE(dialog, nullptr);
+  EXPECT_EQ(dialog->GetTitle().str(),
+            ZEPMsgCatalog::BuildMessage("ZEP2DBaseOptDimFrm", "dimAssocWnd.Title").str());
+  EXPECT_FALSE(dialog->GetTitle().str().empty());
+  ExpectGolden("dim_page_assoc_dialog.dump", ZEPDlgDriver::Dump(dialog));
+}
+
+// The 3D associativity button needs a status that is not negative, the funnel exactly 0.
+TEST_F(DimPage, OptionalControlsFollowTheirInfoStatus) {
+  for (long status : {-1L, 0L, 1L}) {
+    _script.info["DimAssoc3DMod"] = status;
+    _script.info["DimCumulAddFunnel"] = status;
+    Open();
+    EXPECT_EQ(Find("pushAssoc3D") != nullptr, status >= 0) << status;
+    EXPECT_EQ(Find("checkLineUpAutoFunnel") != nullptr, status == 0) << status;
+    EXPECT_EQ(Find("tmpFrame") != nullptr, status == 0) << status;
+    // Absent controls leave the other rows where they are.
+    EXPECT_EQ(Row("frm"), 4) << status;
+    EXPECT_EQ(Row("_frameDimCircle"), 5) << status;
+    if (status >= 0) {
+      EXPECT_EQ(Row("frameDimAssoc3D"), 3);
+      EXPECT_EQ(Find("pushAssoc3D")->GetParentDialog(), Find("frameDimAssoc3D"));
+    }
+  }
+  // A host with the setting but a failed funnel info still writes every other line-up value.
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkLineUpCumulVal")));
+  EXPECT_EQ(Written("SetSysDimAlignCumulValue"), std::vector<double>{1});
+}
+
+TEST_F(DimPage, LayoutOptions) {
+  _script.options = {
+      {"WithFrmCreateDriveAndChamfer", 0}, {"WithLineUpValues", 0}, {"WithFrmDimOrigin", 0}};
+  Open();
+  for (const char* name :
+       {"frm", "checkDimDriveAuto", "chkDetectChamfer", "_labelLineUpBaseOffset",
+        "_labelLineUpOffset", "_editorLineUpBaseOffsetLength", "_editorLineUpBaseOffsetAngle",
+        "_editorLineUpOffsetLength", "_editorLineUpOffsetAngle", "frmDimOriented"})
+    EXPECT_EQ(Find(name), nullptr) << name;
+  EXPECT_EQ(Row("checkLineUpStackVal"), 2);
+  EXPECT_EQ(Row("checkLineUpCumulVal"), 3);
+  EXPECT_EQ(Row("_frameDimCircle"), 5);
+
+  _script.options = {
+      {"WithFrmCreateDriveAndChamfer", 1}, {"WithLineUpValues", 1}, {"WithFrmDimOrigin", 1}};
+  _script.values["DimOriginSymb"] = {1};
+  Open();
+  for (const char* name : {"checkDimDriveAuto", "chkDetectChamfer", "_editorLineUpBaseOffsetAngle",
+                           "_editorLineUpOffsetLength", "chkDimOriginSymb"})
+    EXPECT_NE(Control(name), nullptr) << name;
+  EXPECT_EQ(Row("frmDimOriented"), 3);
+  EXPECT_EQ(Find("frmDimOriented")->GetIconName(), "I_TPSDimOriented");
+  EXPECT_TRUE(Checked("chkDimOriginSymb"));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkDimOriginSymb")));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkDetectChamfer")));
+  EXPECT_EQ(Written("SetSysDimOriginSymb"), std::vector<double>{0});
+  EXPECT_EQ(Written("SetSysDimDetectChamfer"), std::vector<double>{1});
+  EXPECT_EQ(_script.calls.size(), 2u);
+}
+
+TEST_F(DimPage, CircleRadiosShowAndWriteOnChangeOnly) {
+  const struct {
+    int stored;
+    const char* selected;
+  } shown[] = {{1, "_radioDimCircleEdge"},
+               {0, "_radioDimCircleCenter"},
+               {2, "_radioDimCircleCenter"},
+               {-1, "_radioDimCircleCenter"}};
+  for (const auto& s : shown) {
+    _script.values["DimCreateCircle"] = {double(s.stored)};
+    Open();
+    EXPECT_EQ(Selected(kCircle), s.selected) << s.stored;
+  }
+  EXPECT_TRUE(_script.calls.empty());
+
+  // Stored 2 shows the centre: clicking it writes nothing, each switch writes once.
+  for (const char* click : {"_radioDimCircleCenter", "_radioDimCircleEdge", "_radioDimCircleEdge",
+                            "_radioDimCircleCenter", "_radioDimCircleCenter"})
+    ASSERT_TRUE(ZEPDlgDriver::Click(Radio(click))) << click;
+  EXPECT_EQ(Written("SetSysDimCreateCircle"), (std::vector<double>{1, 0}));
+  EXPECT_EQ(_script.calls.size(), 2u);
+
+  // Initialize again shows the stored value and the radios follow it.
+  _script.values["DimCreateCircle"] = {1};
+  _pPage->Initialize();
+  EXPECT_EQ(Selected(kCircle), "_radioDimCircleEdge");
+}
+
+TEST_F(DimPage, FollowingTheCursorDisablesTheLinePosition) {
+  _script.values["DimFollowMouse"] = {1};
+  Open();
+  ZEPDlgSpinner* position = Spinner("editorDimLinePosValue");
+  EXPECT_FALSE(position->IsEffectivelyEnabled());
+  EXPECT_FALSE(ZEPDlgDriver::Enter(position, 0.01));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkDimSketch")));
+  EXPECT_TRUE(position->IsEffectivelyEnabled());
+  ASSERT_TRUE(ZEPDlgDriver::Enter(position, 0.01));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkDimSketch")));
+  EXPECT_FALSE(position->IsEffectivelyEnabled());
+  EXPECT_EQ(Written("SetSysDimFollowMouse"), (std::vector<double>{0, 1}));
+  EXPECT_EQ(Written("SetSysDimConstantOffsetValue"), std::vector<double>{10.0});
+
+  // A locked line position stays disabled whatever the cursor rule says.
+  _script.calls.clear();
+  _script.allInfoSet = true;
+  _script.locked = {"DimConstantOffsetValue"};
+  Open();
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkDimSketch")));
+  EXPECT_EQ(Written("SetSysDimFollowMouse"), std::vector<double>{0});
+  EXPECT_FALSE(Spinner("editorDimLinePosValue")->IsEffectivelyEnabled());
+  EXPECT_EQ(ZEPDlgDriver::WhyNotOperable(Spinner("editorDimLinePosValue")),
+            "locked by test administrator");
+}
+
+TEST_F(DimPage, FunnelNeedsCumulatedValues) {
+  _script.info["DimCumulAddFunnel"] = 0;
+  _script.values = {{"DimAlignCumulValue", {1}}, {"DimCumulAddFunnel", {1}}};
+  Open();
+  ZEPDialog* funnel = Control("checkLineUpAutoFunnel");
+  EXPECT_TRUE(funnel->IsEffectivelyEnabled());
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkLineUpCumulVal")));
+  EXPECT_FALSE(funnel->IsEffectivelyEnabled());
+  EXPECT_TRUE(Checked("checkLineUpAutoFunnel")); // disabled, not changed
+  EXPECT_FALSE(ZEPDlgDriver::Click(funnel));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkLineUpCumulVal")));
+  ASSERT_TRUE(ZEPDlgDriver::Click(funnel));
+  EXPECT_EQ(Written("SetSysDimAlignCumulValue"), (std::vector<double>{0, 1}));
+  EXPECT_EQ(Written("SetSysDimCumulAddFunnel"), std::vector<double>{0});
+  EXPECT_EQ(_script.calls.size(), 3u);
+
+  // Stored without cumulated values the funnel starts disabled.
+  _script.values["DimAlignCumulValue"] = {0};
+  Open();
+  EXPECT_FALSE(Control("checkLineUpAutoFunnel")->IsEffectivelyEnabled());
+
+  // A locked funnel stays disabled when cumulated values are turned on.
+  _script.locked = {"DimCumulAddFunnel"};
+  Open();
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkLineUpCumulVal")));
+  EXPECT_FALSE(Control("checkLineUpAutoFunnel")->IsEffectivelyEnabled());
+}
+
+TEST_F(DimPage, LengthsInMillimetresAndAnglesInDegreesAtTheHooks) {
+  _script.values = {{"DimConstantOffsetValue", {12.5}},
+                    {"DimOffsetRefMM", {3}},
+                    {"DimOffsetRefDeg", {90}},
+                    {"DimOffsetBetMM", {-7}},
+                    {"DimOffsetBetDeg", {-45}}};
+  Open();
+  EXPECT_DOUBLE_EQ(Spinner("editorDimLinePosValue")->GetValue(), 0.0125);
+  EXPECT_DOUBLE_EQ(Spinner("_editorLineUpBaseOffsetLength")->GetValue(), 0.003);
+  EXPECT_DOUBLE_EQ(Spinner("_editorLineUpOffsetLength")->GetValue(), -0.007);
+  EXPECT_EQ(Spinner("_editorLineUpBaseOffsetAngle")->GetValue(), 1.5707963267949054);
+  EXPECT_NEAR(Spinner("_editorLineUpOffsetAngle")->GetValue(), -kPi / 4, 1e-12);
+  EXPECT_EQ(Spinner("editorDimLinePosValue")->GetUnit(), 45);        // millimetres on paper
+  EXPECT_EQ(Spinner("_editorLineUpBaseOffsetAngle")->GetUnit(), 12); // degrees
+
+  ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("editorDimLinePosValue"), 0.02));
+  ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("_editorLineUpBaseOffsetLength"), 0.005));
+  ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("_editorLineUpBaseOffsetAngle"), kPi / 4));
+  ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("_editorLineUpOffsetLength"), 0.25));
+  ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("_editorLineUpOffsetAngle"), -kPi / 2));
+  ASSERT_EQ(_script.calls.size(), 5u);
+  EXPECT_DOUBLE_EQ(Written("SetSysDimConstantOffsetValue").at(0), 20.0);
+  EXPECT_DOUBLE_EQ(Written("SetSysDimOffsetRefMM").at(0), 5.0);
+  EXPECT_EQ(Written("SetSysDimOffsetRefDeg").at(0), 44.99999999999975);
+  EXPECT_DOUBLE_EQ(Written("SetSysDimOffsetBetMM").at(0), 250.0);
+  EXPECT_NEAR(Written("SetSysDimOffsetBetDeg").at(0), -90.0, 1e-9);
+}
+
+// Paper lengths follow the paper unit, not the model unit; values at the hooks stay millimetres.
+TEST_F(DimPage, LengthsInInchesOnPaper) {
+  int inch = 5;
+  ASSERT_EQ(_pOptions->WriteAttr("DrwPaperLengthUnit", &inch, 1), 1);
+  ASSERT_TRUE(ZEPCkeUnitsSetup::SetLengthUnit("METER"));
+  ASSERT_TRUE(ZEPCkeUnitsSetup::SetAngleUnit("RADIAN"));
+  _script.values["DimConstantOffsetValue"] = {25.4};
+  Open();
+  for (const char* name :
+       {"editorDimLinePosValue", "_editorLineUpBaseOffsetLength", "_editorLineUpOffsetLength"}) {
+    ZEPDlgSpinner* length = Spinner(name);
+    EXPECT_EQ(length->GetUnit(), 48) << name; // inches
+    double min = 0, max = 0, step = 0;
+    length->GetMinMaxStep(min, max, step);
+    EXPECT_DOUBLE_EQ(min, -1.0) << name;
+    EXPECT_DOUBLE_EQ(max, 1.0) << name;
+    EXPECT_DOUBLE_EQ(step, 0.0001) << name; // a tenth of a millimetre for inches
+  }
+  for (const char* name : {"_editorLineUpBaseOffsetAngle", "_editorLineUpOffsetAngle"})
+    EXPECT_EQ(Spinner(name)->GetUnit(), 11) << name; // radians
+  EXPECT_DOUBLE_EQ(Spinner("editorDimLinePosValue")->GetValue(), 0.0254);
+  ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("editorDimLinePosValue"), 0.0508));
+  EXPECT_DOUBLE_EQ(Written("SetSysDimConstantOffsetValue").at(0), 50.8);
+}
+
+TEST_F(DimPage, Assoc3DDialogOpenedOperatedAndClosed) {
+  _script.info["DimAssoc3DMod"] = 0;
+  _script.values = {{"DimAssoc3DMod", {2}}, {"AssocDimOnApproximate", {1}}};
+  Open();
+  ZEPDlgDialog* dialog = PushAssoc3D();
+  ASSERT_NE(dialog, nullptr);
+  EXPECT_EQ(dialog->GetVisibility(), ZEPDlgShow);
+  EXPECT_EQ(dialog->GetStyle(), 0x11440201ul);
+  EXPECT_EQ(Selected(kForce2D), "_radioDimForce2DAlways");
+  EXPECT_TRUE(Checked("chkAssocDimOnApproximate"));
+
+  // Each switch writes once; the radio already on writes nothing.
+  for (const char* click :
+       {"_radioDimForce2DAlways", "_radioDimForce2DWhenPb", "_radioDimForce2DNever",
+        "_radioDimForce2DNever", "_radioDimForce2DAlways"})
+    ASSERT_TRUE(ZEPDlgDriver::Click(RadioIn(dialog, click))) << click;
+  ASSERT_TRUE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(dialog, "chkAssocDimOnApproximate")));
+  EXPECT_EQ(Written("SetSysDimAssoc3DMod"), (std::vector<double>{1, 0, 2}));
+  EXPECT_EQ(Written("SetSysAssocDimOnApproximate"), std::vector<double>{0});
+  ASSERT_TRUE(ZEPDlgDriver::Click(RadioIn(dialog, "_radioDimForce2DWhenPb")));
+
+  // Either close button: the dialog stays on screen until idle time but no longer writes.
+  for (bool windowButton : {false, true}) {
+    _script.calls.clear();
+    ASSERT_TRUE(windowButton ? ZEPDlgDriver::Close(dialog) : ZEPDlgDriver::CloseDialog(dialog));
+    ASSERT_EQ(Dialogs().size(), 1u);
+    ASSERT_TRUE(ZEPDlgDriver::Click(RadioIn(dialog, "_radioDimForce2DNever")));
+    ASSERT_TRUE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(dialog, "chkAssocDimOnApproximate")));
+    ASSERT_TRUE(ZEPDlgDriver::CloseDialog(dialog)); // a second close changes nothing either
+    EXPECT_TRUE(_script.calls.empty()) << windowButton;
+    ZEPDlgDriver::Idle();
+    EXPECT_TRUE(Dialogs().empty());
+
+    // A fresh dialog shows the values last written, not what the closed one showed.
+    dialog = PushAssoc3D();
+    ASSERT_NE(dialog, nullptr);
+    EXPECT_EQ(Selected(kForce2D), "_radioDimForce2DWhenPb");
+    EXPECT_FALSE(Checked("chkAssocDimOnApproximate"));
+  }
+  // The page may go before idle time with its closed dialog still waiting for destruction.
+  ASSERT_TRUE(ZEPDlgDriver::CloseDialog(dialog));
+  delete _pWindow;
+  _pWindow = nullptr;
+  ZEPDlgDriver::Idle();
+  EXPECT_TRUE(_root.GetChildren().empty());
+}
+
+TEST_F(DimPage, Assoc3DDialogPressedTwiceStaysOne) {
+  _script.info["DimAssoc3DMod"] = 0;
+  Open();
+  ZEPDlgDialog* first = PushAssoc3D();
+  ASSERT_NE(first, nullptr);
+  first->SetVisibility(ZEPDlgHide); // behind the page, say
+  ASSERT_TRUE(ZEPDlgDriver::Click(Find("pushAssoc3D")));
+  ASSERT_EQ(Dialogs(), std::vector<ZEPDlgDialog*>{first});
+  EXPECT_EQ(first->GetVisibility(), ZEPDlgShow);
+  // The one dialog still writes and closes.
+  ASSERT_TRUE(ZEPDlgDriver::Click(RadioIn(first, "_radioDimForce2DAlways")));
+  EXPECT_EQ(Written("SetSysDimAssoc3DMod"), std::vector<double>{2});
+  ASSERT_TRUE(ZEPDlgDriver::Close(first));
+  ZEPDlgDriver::Idle();
+  EXPECT_TRUE(Dialogs().empty());
+  EXPECT_NE(PushAssoc3D(), nullptr);
+  EXPECT_EQ(Dialogs().size(), 1u);
+}
+
+TEST_F(DimPage, Force2DRadiosShowTheStoredMode) {
+  _script.info["DimAssoc3DMod"] = 0;
+  const struct {
+    int stored;
+    const char* selected;
+  } shown[] = {{2, "_radioDimForce2DAlways"},
+               {1, "_radioDimForce2DWhenPb"},
+               {0, "_radioDimForce2DNever"},
+               {5, "_radioDimForce2DNever"}};
+  for (const auto& s : shown) {
+    _script.values["DimAssoc3DMod"] = {double(s.stored)};
+    Open();
+    ASSERT_NE(PushAssoc3D(), nullptr);
+    EXPECT_EQ(Selected(kForce2D), s.selected) << s.stored;
+  }
+  // Stored 5 shows Never: clicking it writes nothing, the first switch writes.
+  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("_radioDimForce2DNever")));
+  EXPECT_TRUE(_script.calls.empty());
+  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("_radioDimForce2DWhenPb")));
+  EXPECT_EQ(Written("SetSysDimAssoc3DMod"), std::vector<double>{1});
+}
+
+TEST_F(DimPage, LocksInsideTheAssoc3DDialog) {
+  // Only the mode has lock information; the approximate flag's hook leaves its record alone.
+  _script.info["DimAssoc3DMod"] = 0;
+  _script.locked = {"DimAssoc3DMod"};
+  Open();
+  ZEPDlgDialog* dialog = PushAssoc3D();
+  ASSERT_NE(dialog, nullptr);
+  for (const char* name : kForce2D) {
+    EXPECT_FALSE(RadioIn(dialog, name)->IsEffectivelyEnabled()) << name;
+    EXPECT_FALSE(ZEPDlgDriver::Click(RadioIn(dialog, name))) << name;
+  }
+  // Each setting of the dialog has a lock record of its own.
+  ZEPDialog* approximate = ZEPDlgDriver::FindControl(dialog, "chkAssocDimOnApproximate");
+  EXPECT_EQ(ZEPDlgDriver::WhyNotOperable(approximate), "");
+  ASSERT_TRUE(ZEPDlgDriver::Click(approximate));
+  ASSERT_EQ(_script.calls.size(), 1u);
+  EXPECT_EQ(_script.calls[0].hook, "SetSysAssocDimOnApproximate");
+  ASSERT_TRUE(ZEPDlgDriver::CloseDialog(dialog));
+  ZEPDlgDriver::Idle();
+
+  _script.calls.clear();
+  _script.allInfoSet = true;
+  _script.locked = {"AssocDimOnApproximate"};
+  Open();
+  dialog = PushAssoc3D();
+  ASSERT_NE(dialog, nullptr);
+  EXPECT_EQ(
+      ZEPDlgDriver::WhyNotOperable(ZEPDlgDriver::FindControl(dialog, "chkAssocDimOnApproximate")),
+      "locked by test administrator");
+  ASSERT_TRUE(ZEPDlgDriver::Click(RadioIn(dialog, "_radioDimForce2DWhenPb")));
+  EXPECT_EQ(Written("SetSysDimAssoc3DMod"), std::vector<double>{1});
+  EXPECT_EQ(_script.calls.size(), 1u);
+}
+
+TEST_F(DimPage, RegisteredWithTheObjectModel) {
+  Open();
+  EXPECT_STREQ(ZEP2DBaseOptDimFrm::ClassName(), "ZEP2DBaseOptDimFrm");
+  EXPECT_STREQ(ZEP2DBaseOptDimFrm::ClassId(), "ZEP2DBaseOptDimFrm");
+  const ZEPMetaObject* meta = ZEPFindMetaObject("ZEP2DBaseOptDimFrm");
+  ASSERT_NE(meta, nullptr);
+  EXPECT_EQ(meta, ZEP2DBaseOptDimFrm::MetaObject());
+  EXPECT_EQ(meta->GetBase(), ZEPDlgFrame::MetaObject());
+  EXPECT_STREQ(meta->GetExtendedType(), "ZEPNull");
+  EXPECT_STREQ(meta->GetFramework(), "DraftingBaseSettings");
+  EXPECT_EQ(meta->CreateInstance(), nullptr);
+
+  EXPECT_EQ(_pPage->GetMetaObject(), meta);
+  EXPECT_STREQ(_pPage->IsA(), "ZEP2DBaseOptDimFrm");
+  EXPECT_EQ(_pPage->IsAKindOf("ZEPDlgFrame"), 1);
+  EXPECT_EQ(_pPage->IsAKindOf("ZEP2DBaseOptDimFrm"), 1);
+  EXPECT_EQ(_pPage->IsAKindOf("ZEPDlgDialog"), 0);
+  EXPECT_EQ(ZEPSysDynamicCast<ZEP2DBaseOptDimFrm>(static_cast<ZEPBaseUnknown*>(_pPage)), _pPage);
+  EXPECT_EQ(ZEPSysDynamicCast<ZEP2DBaseOptDimFrm>(static_cast<ZEPBaseUnknown*>(_pWindow)), nullptr);
+}
