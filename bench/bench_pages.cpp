@@ -1,4 +1,5 @@
 // Page costs: building and initialising each page, and one user change reaching its hook.
+#include "ZEP2DBaseOptDimFrm.h"
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
@@ -32,6 +33,11 @@ struct PrimaryViewPage : ZEP2DBasePrimaryViewFrm {
   ZEPString GetFrameIconName() override { return "I_PrimaryView"; }
 #include "ZEP2DBasePrimaryViewFrm.def"
 };
+struct DimPage : ZEP2DBaseOptDimFrm {
+  explicit DimPage(ZEPDialog* iParent) : ZEP2DBaseOptDimFrm(iParent, "DimensionPage") {}
+  long _writes = 0;
+#include "ZEP2DBaseOptDimFrm.def"
+};
 struct GeoPage : ZEP2DBaseOptGeoFrm {
   explicit GeoPage(ZEPDialog* iParent) : ZEP2DBaseOptGeoFrm(iParent, "GeometryPage") {}
   long _writes = 0;
@@ -40,7 +46,11 @@ struct GeoPage : ZEP2DBaseOptGeoFrm {
 };
 #undef ZEP_SETTING
 
+// The drafting options the host keeps open: pages read the paper length unit there.
+void OpenDraftingOptions() { ZEPSysSettingRepository::Open("DraftingOptions"); }
+
 template <class Page> void BuildAndInitialize(benchmark::State& state) {
+  OpenDraftingOptions();
   ZEPDlgWindow root(nullptr, "root", 0);
   for (auto _ : state) {
     auto* page = new Page(&root);
@@ -66,9 +76,11 @@ BENCHMARK_TEMPLATE(BuildAndInitialize, GridPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, GalPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, PrimaryViewPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, GeoPage);
+BENCHMARK_TEMPLATE(BuildAndInitialize, DimPage);
 
 // A sub-dialog as the user goes through it: press its button, tick a check, close it.
 void GeoSubDialogRoundTrip(benchmark::State& state) {
+  OpenDraftingOptions();
   ZEPDlgWindow root(nullptr, "root", 0);
   auto* page = new GeoPage(&root);
   page->Build();

@@ -3,6 +3,7 @@
 
 #include "PageRecorder.h"
 
+#include "ZEP2DBaseOptDimFrm.h"
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
@@ -65,8 +66,6 @@ template <class Page> Page* OpenPage(HookScript& iScript, ZEPDialog* iParent) {
   page->Initialize();
   return page;
 }
-
-#include "ZEP2DBaseOptDimFrm.h"
 
 // The dimension page; its layout options answer from the script, else as the module does.
 class RecordingDimPage : public Recording<ZEP2DBaseOptDimFrm> {

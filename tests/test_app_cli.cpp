@@ -486,3 +486,24 @@ TEST_F(AppCli, GeometryPageShowsTheGridPageSettings) {
   EXPECT_EQ(Run({"reset", "geometry", "checkSnap"}).code, kExitOk);
   EXPECT_EQ(Run({"get", "grid", "checkSnap"}).out, "on\n");
 }
+
+TEST_F(AppCli, DimensionPageWithItsAssociativityDialog) {
+  Result force = Run({"set", "dimension", "_frameDimForce2D", "always"});
+  ASSERT_EQ(force.code, kExitOk) << force.err;
+  EXPECT_EQ(Stored("DraftingOptions", "DrwDimAssoc3DMod"), std::vector<double>{2});
+  EXPECT_EQ(Run({"set", "dimension", "chkAssocDimOnApproximate", "on"}).code, kExitOk);
+  EXPECT_EQ(Run({"set", "dimension", "_frameDimCircleRadio", "2"}).code, kExitOk);
+  EXPECT_EQ(Stored("DraftingOptions", "DrwDimCreateCircle"), std::vector<double>{1});
+  // Angles in degrees at the store, whatever the user typed.
+  EXPECT_EQ(Run({"set", "dimension", "_editorLineUpOffsetAngle", "0.5rad"}).code, kExitOk);
+  EXPECT_NEAR(Stored("DraftingOptions", "DrwDimOffsetBetDeg")[0], 28.6479, 1e-3);
+  // The line position follows the cursor rule the other way round.
+  Result followed = Run({"set", "dimension", "editorDimLinePosValue", "5mm"});
+  EXPECT_EQ(followed.code, kExitRefused);
+  EXPECT_NE(followed.err.find("is on; turn \"Dimension follows the cursor\" (checkDimSketch) off first"),
+            std::string::npos)
+      << followed.err;
+  ASSERT_EQ(Run({"set", "dimension", "checkDimSketch", "off"}).code, kExitOk);
+  EXPECT_EQ(Run({"set", "dimension", "editorDimLinePosValue", "5mm"}).code, kExitOk);
+  EXPECT_EQ(Stored("DraftingOptions", "DrwDimConstantOffsetValue"), std::vector<double>{5});
+}

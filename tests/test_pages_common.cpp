@@ -24,6 +24,9 @@ const std::vector<std::string> kGalAttributes = {
 const std::vector<std::string> kPrimaryViewAttributes = {
 #include "ZEP2DBasePrimaryViewFrm.def"
 };
+const std::vector<std::string> kDimAttributes = {
+#include "ZEP2DBaseOptDimFrm.def"
+};
 const std::vector<std::string> kGeoAttributes = {
     // with those of the embedded grid page
 #include "ZEP2DBaseOptGeoFrm.def"

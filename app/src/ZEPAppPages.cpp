@@ -1,5 +1,6 @@
 #include "ZEPAppPages.h"
 
+#include "ZEP2DBaseOptDimFrm.h"
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
@@ -67,6 +68,21 @@ private:
   ZEPAppBinding _binding{"Geometry"};
 };
 
+// Every section of the dimension page is shown, the oriented dimensions' origin symbol too.
+class DimensionPage : public ZEP2DBaseOptDimFrm {
+public:
+  explicit DimensionPage(ZEPDialog* iParent) : ZEP2DBaseOptDimFrm(iParent, "DimensionPage") {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)
+#include "ZEP2DBaseOptDimFrm.def"
+#undef ZEP_SETTING
+  unsigned char WithFrmDimOrigin() override { return 1; }
+
+private:
+  ZEPAppBinding _binding{"Dimension"};
+};
+
 template <class Page> ZEPDlgFrame* Open(ZEPDialog* iParent) {
   auto* page = new Page(iParent);
   page->Build();
@@ -84,6 +100,9 @@ const std::map<std::string, ZEPAppStored> kGeneralStored = {
 const std::map<std::string, ZEPAppStored> kPrimaryViewStored = {
 #include "ZEP2DBasePrimaryViewFrm.def"
 };
+const std::map<std::string, ZEPAppStored> kDimensionStored = {
+#include "ZEP2DBaseOptDimFrm.def"
+};
 const std::map<std::string, ZEPAppStored> kGeometryStored = {
 #include "ZEP2DBaseOptGeoFrm.def"
 };
@@ -93,6 +112,7 @@ const std::map<std::string, ZEPAppStored> kGeometryStored = {
 const std::vector<ZEPAppPage>& AppPages() {
   static const std::vector<ZEPAppPage> pages = {
       {"general", "General", "General", &Open<GeneralPage>, kGeneralStored, {}, {}},
+      {"dimension", "Dimension", "Dimension", &Open<DimensionPage>, kDimensionStored, {"pushAssoc3D"}, {}},
       {"grid", "Grid", "Grid", &Open<GridPage>, kGridStored, {}, {}},
       {"geometry",
        "Geometry",
