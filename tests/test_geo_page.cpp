@@ -64,6 +64,12 @@ TEST_F(GeoPage, ModuleHooksShowZerosAndDisableTheDependants) {
   EXPECT_EQ(_script.reads.back(), "DittoPreventScale");
   EXPECT_EQ(ZEPCheckLog::Count(), 0);
   ExpectGolden("geo_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
+  // The dialogs with the module's hooks, their buttons enabled by the two flags alone.
+  _script.values = {{"AllowGeomManip", {1}}, {"DisplayCst", {1}}};
+  Open();
+  std::string dialogs;
+  for (const auto& d : kDialogs) dialogs += ZEPDlgDriver::Dump(OpenDialog(d[0], d[1]));
+  ExpectGolden("geo_dialogs_module_hooks.dump", dialogs);
 }
 
 TEST_F(GeoPage, WithoutGridPageTheSectionsKeepTheirRows) {
