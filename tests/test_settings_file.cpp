@@ -226,7 +226,7 @@ TEST_F(SettingsFileTest, FailedSaveLeavesTheOldFileAndNoTemporaryFile) {
   repo->WriteAttr("DrwPaperLengthUnit", &value, 1);
   ASSERT_EQ(S_OK, repo->SaveRepository()) << store.LastError();
   const std::string old = ReadBytes(_user);
-  const std::set<std::string> onlyTheFile = {"settings.json"};
+  const std::set<std::string> onlyTheFile = {"settings.json", "settings.json.lock"};
 
   for (auto step : {FaultyOps::CreateStep, FaultyOps::WriteStep, FaultyOps::FlushStep, FaultyOps::SyncStep,
                     FaultyOps::CloseStep, FaultyOps::RenameStep}) {
@@ -476,9 +476,24 @@ TEST_F(SettingsFileTest, DefaultLocationsFollowOptionsThenEnvironment) {
   ScopedEnv xdg("XDG_CONFIG_HOME", nullptr);
   ScopedEnv userEnv(kSettingsFileEnv, nullptr);
   ScopedEnv adminEnv(kAdminFileEnv, nullptr);
+  ScopedEnv systemDirs("XDG_CONFIG_DIRS", nullptr);
   ZEPAppSettingsPaths p = ResolveSettingsPaths();
   EXPECT_EQ("/home/bob/.config/drafting-options/settings.json", p.user);
-  EXPECT_EQ("", p.admin);
+  EXPECT_EQ("/etc/xdg/drafting-options/admin.json", p.admin) << "locks apply without any environment";
+  {
+    // The first folder that holds the file wins; relative folders do not count.
+    const fs::path dir = fs::temp_directory_path() / ("zep_xdg_" + std::to_string(::getpid()));
+    fs::create_directories(dir / "b" / "drafting-options");
+    WriteBytes(dir / "b" / "drafting-options" / "admin.json", "{}");
+    const std::string dirs = "rel:" + (dir / "a").string() + ":" + (dir / "b").string();
+    ScopedEnv x("XDG_CONFIG_DIRS", dirs.c_str());
+    EXPECT_EQ((dir / "b" / "drafting-options" / "admin.json").string(), ResolveSettingsPaths().admin);
+    EXPECT_EQ((dir / "b" / "drafting-options" / "admin.json").string(), ResolveSettingsPaths("", "").admin)
+        << "an empty option does not drop the locks";
+    fs::remove_all(dir / "b");
+    EXPECT_EQ((dir / "a" / "drafting-options" / "admin.json").string(), ResolveSettingsPaths().admin);
+    fs::remove_all(dir);
+  }
   {
     ScopedEnv x("XDG_CONFIG_HOME", "/cfg");
     EXPECT_EQ("/cfg/drafting-options/settings.json", ResolveSettingsPaths().user);
