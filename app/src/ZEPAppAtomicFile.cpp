@@ -127,18 +127,18 @@ bool ReadRegularFile(const std::string& iPath, std::size_t iMaxSize, std::string
   int fd = ::open(iPath.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC);
   if (fd < 0) {
     if (errno == ENOENT) return true; // first run, or a link to a file not written yet
-    oError = iPath + ": cannot open: " + Why(LastErrno());
+    oError = "cannot open: " + Why(LastErrno());
     return false;
   }
   oExists = true;
   struct stat st;
   if (::fstat(fd, &st) != 0) {
-    oError = iPath + ": cannot read: " + Why(LastErrno());
+    oError = "cannot read: " + Why(LastErrno());
     ::close(fd);
     return false;
   }
   if (!S_ISREG(st.st_mode)) {
-    oError = iPath + " is " + KindOf(st.st_mode) + ", expected a regular settings file";
+    oError = std::string("is ") + KindOf(st.st_mode) + ", expected a regular settings file";
     ::close(fd);
     return false;
   }
@@ -148,14 +148,14 @@ bool ReadRegularFile(const std::string& iPath, std::size_t iMaxSize, std::string
     const ssize_t n = ::read(fd, buffer, sizeof buffer);
     if (n < 0 && errno == EINTR) continue;
     if (n < 0) {
-      oError = iPath + ": cannot read: " + Why(LastErrno());
+      oError = "cannot read: " + Why(LastErrno());
       ::close(fd);
       oText.clear();
       return false;
     }
     if (n == 0) break;
     if (oText.size() + static_cast<std::size_t>(n) > iMaxSize) {
-      oError = iPath + " is larger than " + std::to_string(iMaxSize) + " bytes, too large for a settings file";
+      oError = "is larger than " + std::to_string(iMaxSize) + " bytes, too large for a settings file";
       ::close(fd);
       oText.clear();
       return false;

@@ -43,7 +43,8 @@ bool ResolveLinks(const std::string& iPath, std::string& oTarget, std::string& o
 // Reads a settings file. It is opened without blocking and checked after opening, so that a
 // FIFO, device, socket or folder is refused (with its path) rather than waited on or read; at
 // most iMaxSize bytes are read however large the file claims to be. A missing file is no error:
-// oExists false and empty text. False with oError (which starts with the path) otherwise.
+// oExists false and empty text. False otherwise, with oError saying why after the path
+// ("is a FIFO, expected a regular settings file").
 bool ReadRegularFile(const std::string& iPath, std::size_t iMaxSize, std::string& oText, bool& oExists,
                      std::string& oError);
 

@@ -70,12 +70,15 @@ public:
     for (const ZEPAppFileError& w : _file.LoadWarnings())
       _err << "warning: " << w.Text() << "\n";
     if (SUCCEEDED(rc)) return kExitOk;
-    bool userFaulty = false;
+    // A file that cannot be read at all (a FIFO, a device, too large) is not shown around.
+    bool userFaulty = false, unreadable = false;
     for (const ZEPAppFileError& e : _file.LoadErrors()) {
-      _err << (iWrites ? "error: " : "warning: ") << e.Text() << "\n";
       userFaulty = userFaulty || e.path == _paths.user;
+      unreadable = unreadable || e.unreadable;
     }
-    if (iWrites) {
+    for (const ZEPAppFileError& e : _file.LoadErrors())
+      _err << (iWrites || unreadable ? "error: " : "warning: ") << e.Text() << "\n";
+    if (iWrites || unreadable) {
       _err << "error: nothing was changed; correct or remove the faulty file, then try again\n";
       return kExitFile;
     }

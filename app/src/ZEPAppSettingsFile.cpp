@@ -40,7 +40,7 @@ std::string HomeFolder() {
 
 // Only regular files are read, and at most kMaxFileSize bytes of them.
 bool ReadFile(const std::string& iPath, std::string& oText, bool& oExists, ZEPAppFileError& oError) {
-  oError = ZEPAppFileError{iPath, 0, 0, ""};
+  oError = ZEPAppFileError{iPath, 0, 0, "", true};
   return ReadRegularFile(iPath, kMaxFileSize, oText, oExists, oError.message);
 }
 
@@ -222,7 +222,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
         oFaults.insert(oFaults.end(), faults.begin(), faults.end());
       }
     } catch (const std::exception& ex) { // out of memory and the like: still a report, not a crash
-      oFaults.push_back(ZEPAppFileError{ioFile.path, 0, 0, std::string("cannot be read: ") + ex.what()});
+      oFaults.push_back(ZEPAppFileError{ioFile.path, 0, 0, std::string("cannot be read: ") + ex.what(), true});
     }
     if (oFaults.empty()) return true;
     ioFile.fault = oFaults.front();

@@ -64,6 +64,9 @@ struct ZEPAppFileError {
   int line = 0;
   int column = 0;
   std::string message;
+  // The file could not be read at all (not opened, not a regular file, too large), rather
+  // than read and found faulty.
+  bool unreadable = false;
   // "path:line:column: message", the form editors jump to.
   std::string Text() const;
 };

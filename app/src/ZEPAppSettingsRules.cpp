@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <charconv>
+#include <cmath>
 #include <map>
 #include <set>
 #include <type_traits>
@@ -109,9 +110,14 @@ template <class Values> std::string CheckEach(const Values& iValues, const Limit
 } // namespace
 
 std::string FormatNumber(double iValue) {
-  char buffer[64]; // std::to_chars needs at most 24 characters for the shortest form of a double
-  const auto result = std::to_chars(buffer, buffer + sizeof buffer, iValue);
-  return std::string(buffer, result.ptr);
+  // Plain digits where people read them so, exponents for the very large and very small; the
+  // shortest digits that read back to the same double either way.
+  const double magnitude = std::fabs(iValue);
+  const bool plain = magnitude == 0.0 || (magnitude >= 1e-6 && magnitude < 1e21);
+  char buffer[128]; // a plain number below 1e21 or an exponent form needs far less
+  const auto result = std::to_chars(buffer, buffer + sizeof buffer, iValue,
+                                    plain ? std::chars_format::fixed : std::chars_format::scientific);
+  return result.ec == std::errc() ? std::string(buffer, result.ptr) : std::to_string(iValue);
 }
 
 std::vector<ZEPAppAttrRule> AppSettingRules() {
