@@ -1,5 +1,5 @@
 // The settings files: round trips, atomic saves under failure, and faulty files.
-#include "TestSupport.h"
+#include "SettingsFileSupport.h"
 #include "ZEPAppSettingsFile.h"
 
 #include <cerrno>
@@ -17,18 +17,6 @@ using namespace zepapp;
 namespace fs = std::filesystem;
 
 namespace {
-
-std::string ReadBytes(const fs::path& iPath) {
-  std::ifstream in(iPath, std::ios::binary);
-  return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
-}
-
-// A fresh file each time: truncating one in place makes some file systems flush it at once.
-void WriteBytes(const fs::path& iPath, const std::string& iText) {
-  std::error_code ec;
-  fs::remove(iPath, ec);
-  std::ofstream(iPath, std::ios::binary) << iText;
-}
 
 std::set<std::string> Entries(const fs::path& iDir) {
   std::set<std::string> names;
@@ -91,23 +79,7 @@ public:
   int SyncDir(const std::string& d) override { return failAt == SyncDirStep ? EIO : ZEPAppPosixFileOps::SyncDir(d); }
 };
 
-class SettingsFileTest : public ZEPHostTest {
-protected:
-  void SetUp() override {
-    ZEPHostTest::SetUp();
-    std::string pattern = (fs::temp_directory_path() / "zep_settings_XXXXXX").string();
-    ASSERT_NE(nullptr, mkdtemp(pattern.data()));
-    _dir = pattern;
-    _user = _dir / "settings.json";
-    _admin = _dir / "admin.json";
-  }
-  void TearDown() override {
-    std::error_code ec;
-    fs::remove_all(_dir, ec);
-    ZEPHostTest::TearDown();
-  }
-  fs::path _dir, _user, _admin;
-};
+using SettingsFileTest = SettingsFolderTest;
 
 template <class T> std::vector<T> Read(ZEPSysSettingRepository* iRepo, const char* iName, int iCount) {
   std::vector<T> v(static_cast<std::size_t>(iCount));

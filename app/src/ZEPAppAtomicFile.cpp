@@ -192,7 +192,7 @@ bool ZEPAppFileLock::Acquire(const std::string& iTarget, int iTimeoutMs, std::st
     return false;
   }
   const auto deadline = std::chrono::steady_clock::now() + std::chrono::milliseconds(std::max(0, iTimeoutMs));
-  auto pause = std::chrono::milliseconds(2);
+  auto pause = std::chrono::microseconds(200);
   for (;;) {
     if (::flock(fd, LOCK_EX | LOCK_NB) == 0) break;
     const int err = errno;
@@ -208,7 +208,7 @@ bool ZEPAppFileLock::Acquire(const std::string& iTarget, int iTimeoutMs, std::st
       return false;
     }
     std::this_thread::sleep_for(pause);
-    pause = std::min(pause * 2, std::chrono::milliseconds(50));
+    pause = std::min(pause * 2, std::chrono::microseconds(2000)); // short: a waiter must not starve
   }
   _fd = fd;
   return true;
