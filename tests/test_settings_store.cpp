@@ -13,6 +13,7 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
+#include <map>
 #include <sstream>
 
 #include <sys/stat.h>
@@ -139,7 +140,8 @@ TEST_F(SettingsStore, ConcurrentSavesAndLocksLoseNothing) {
       if (FAILED(store.Load(_u, _a))) return;
       ZEPSysSettingRepository* repo = store.OpenSettings("DraftingOptions");
       for (int round = 0; round < 50; ++round) {
-        const std::string attr = "P" + std::to_string(iChild) + "_" + std::to_string(round);
+        // Five attributes of its own, each set ten times: the file stays small.
+        const std::string attr = "P" + std::to_string(iChild) + "_" + std::to_string(round % 5);
         long rc;
         if (admin) {
           rc = store.Lock("DraftingOptions", attr, std::vector<int>{round});
@@ -152,19 +154,23 @@ TEST_F(SettingsStore, ConcurrentSavesAndLocksLoseNothing) {
     });
     const nlohmann::json stored = nlohmann::json::parse(ReadBytes(file));
     const nlohmann::json& repo = stored.at("settings").at("DraftingOptions");
+    // The last value each run saved for each of its attributes is the one in the file.
+    std::map<std::string, int> last;
     std::size_t saved = 0;
     for (const std::string& report : reports)
       for (const std::string& line : Lines(report)) {
         ++saved;
-        const std::string attr = line.substr(0, line.find(' '));
-        ASSERT_TRUE(repo.contains(attr)) << attr << " was saved and then lost";
-        EXPECT_EQ(std::stoi(line.substr(line.find(' ') + 1)), repo[attr].at("int").get<int>());
-        if (admin) {
-          EXPECT_TRUE(repo[attr].value("locked", false)) << attr;
-        }
+        last[line.substr(0, line.find(' '))] = std::stoi(line.substr(line.find(' ') + 1));
       }
+    for (const auto& [attr, value] : last) {
+      ASSERT_TRUE(repo.contains(attr)) << attr << " was saved and then lost";
+      EXPECT_EQ(value, repo[attr].at("int").get<int>()) << attr << ": a later save was lost";
+      if (admin) {
+        EXPECT_TRUE(repo[attr].value("locked", false)) << attr;
+      }
+    }
     EXPECT_EQ(400u, saved) << "every save got the lock in time";
-    EXPECT_EQ(saved, repo.size());
+    EXPECT_EQ(40u, repo.size());
   }
 }
 
