@@ -23,11 +23,14 @@ bool ZEPCallbackManager::RemoveCallback(CallbackId iId) {
 void ZEPCallbackManager::DispatchCallbacks(const char* iEventName, ZEPNotification* iNotif,
                                            void* iData) {
   if (!iEventName) return;
-  // Work on the ids known now: callbacks may change the subscriptions while we run.
+  // Work on the ids known now: callbacks may change the subscriptions while we run, or
+  // destroy this manager.
+  const std::shared_ptr<bool> alive = _pAlive;
   std::vector<CallbackId> ids;
   for (const Subscription& s : _subscriptions)
     if (s.event == iEventName) ids.push_back(s.id);
   for (CallbackId id : ids) {
+    if (!*alive) return;
     auto it = std::find_if(_subscriptions.begin(), _subscriptions.end(),
                            [id](const Subscription& s) { return s.id == id; });
     if (it == _subscriptions.end()) continue; // removed by an earlier callback

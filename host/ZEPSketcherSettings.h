@@ -5,6 +5,7 @@
 #include "ZEPSystem.h"
 
 #include <functional>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -45,7 +46,7 @@ public:
   using CallbackId = unsigned long;
 
   ZEPCallbackManager() = default;
-  ~ZEPCallbackManager() override = default;
+  ~ZEPCallbackManager() override { *_pAlive = false; }
   ZEPCallbackManager(const ZEPCallbackManager&) = delete;
   ZEPCallbackManager& operator=(const ZEPCallbackManager&) = delete;
 
@@ -57,7 +58,8 @@ public:
 
   // Calls every callback subscribed to iEventName. A callback may subscribe or unsubscribe
   // during the dispatch; those changes apply from the next dispatch on, except that a callback
-  // removed during the dispatch is no longer called.
+  // removed during the dispatch is no longer called. A callback may also destroy the manager
+  // itself (its subscriber going away with it): the dispatch then stops.
   void DispatchCallbacks(const char* iEventName, ZEPNotification* iNotif, void* iData);
 
 private:
@@ -68,6 +70,8 @@ private:
   };
   std::vector<Subscription> _subscriptions;
   CallbackId _lastId = 0;
+  // Shared with running dispatches, which must not touch a destroyed manager.
+  std::shared_ptr<bool> _pAlive = std::make_shared<bool>(true);
 };
 
 // What the sketcher asks of its settings. Getters answer the current value; setters take

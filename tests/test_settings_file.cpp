@@ -1,5 +1,5 @@
 // The settings files: round trips, atomic saves under failure, and faulty files.
-#include "TestSupport.h"
+#include "SettingsFileSupport.h"
 #include "ZEPAppSettingsFile.h"
 
 #include <cerrno>
@@ -17,18 +17,6 @@ using namespace zepapp;
 namespace fs = std::filesystem;
 
 namespace {
-
-std::string ReadBytes(const fs::path& iPath) {
-  std::ifstream in(iPath, std::ios::binary);
-  return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
-}
-
-// A fresh file each time: truncating one in place makes some file systems flush it at once.
-void WriteBytes(const fs::path& iPath, const std::string& iText) {
-  std::error_code ec;
-  fs::remove(iPath, ec);
-  std::ofstream(iPath, std::ios::binary) << iText;
-}
 
 std::set<std::string> Entries(const fs::path& iDir) {
   std::set<std::string> names;
@@ -91,23 +79,7 @@ public:
   int SyncDir(const std::string& d) override { return failAt == SyncDirStep ? EIO : ZEPAppPosixFileOps::SyncDir(d); }
 };
 
-class SettingsFileTest : public ZEPHostTest {
-protected:
-  void SetUp() override {
-    ZEPHostTest::SetUp();
-    std::string pattern = (fs::temp_directory_path() / "zep_settings_XXXXXX").string();
-    ASSERT_NE(nullptr, mkdtemp(pattern.data()));
-    _dir = pattern;
-    _user = _dir / "settings.json";
-    _admin = _dir / "admin.json";
-  }
-  void TearDown() override {
-    std::error_code ec;
-    fs::remove_all(_dir, ec);
-    ZEPHostTest::TearDown();
-  }
-  fs::path _dir, _user, _admin;
-};
+using SettingsFileTest = SettingsFolderTest;
 
 template <class T> std::vector<T> Read(ZEPSysSettingRepository* iRepo, const char* iName, int iCount) {
   std::vector<T> v(static_cast<std::size_t>(iCount));
@@ -226,7 +198,7 @@ TEST_F(SettingsFileTest, FailedSaveLeavesTheOldFileAndNoTemporaryFile) {
   repo->WriteAttr("DrwPaperLengthUnit", &value, 1);
   ASSERT_EQ(S_OK, repo->SaveRepository()) << store.LastError();
   const std::string old = ReadBytes(_user);
-  const std::set<std::string> onlyTheFile = {"settings.json"};
+  const std::set<std::string> onlyTheFile = {"settings.json", "settings.json.lock"};
 
   for (auto step : {FaultyOps::CreateStep, FaultyOps::WriteStep, FaultyOps::FlushStep, FaultyOps::SyncStep,
                     FaultyOps::CloseStep, FaultyOps::RenameStep}) {
@@ -476,9 +448,24 @@ TEST_F(SettingsFileTest, DefaultLocationsFollowOptionsThenEnvironment) {
   ScopedEnv xdg("XDG_CONFIG_HOME", nullptr);
   ScopedEnv userEnv(kSettingsFileEnv, nullptr);
   ScopedEnv adminEnv(kAdminFileEnv, nullptr);
+  ScopedEnv systemDirs("XDG_CONFIG_DIRS", nullptr);
   ZEPAppSettingsPaths p = ResolveSettingsPaths();
   EXPECT_EQ("/home/bob/.config/drafting-options/settings.json", p.user);
-  EXPECT_EQ("", p.admin);
+  EXPECT_EQ("/etc/xdg/drafting-options/admin.json", p.admin) << "locks apply without any environment";
+  {
+    // The first folder that holds the file wins; relative folders do not count.
+    const fs::path dir = fs::temp_directory_path() / ("zep_xdg_" + std::to_string(::getpid()));
+    fs::create_directories(dir / "b" / "drafting-options");
+    WriteBytes(dir / "b" / "drafting-options" / "admin.json", "{}");
+    const std::string dirs = "rel:" + (dir / "a").string() + ":" + (dir / "b").string();
+    ScopedEnv x("XDG_CONFIG_DIRS", dirs.c_str());
+    EXPECT_EQ((dir / "b" / "drafting-options" / "admin.json").string(), ResolveSettingsPaths().admin);
+    EXPECT_EQ((dir / "b" / "drafting-options" / "admin.json").string(), ResolveSettingsPaths("", "").admin)
+        << "an empty option does not drop the locks";
+    fs::remove_all(dir / "b");
+    EXPECT_EQ((dir / "a" / "drafting-options" / "admin.json").string(), ResolveSettingsPaths().admin);
+    fs::remove_all(dir);
+  }
   {
     ScopedEnv x("XDG_CONFIG_HOME", "/cfg");
     EXPECT_EQ("/cfg/drafting-options/settings.json", ResolveSettingsPaths().user);

@@ -4,6 +4,7 @@
 #include "ZEPAppPages.h"
 #include "ZEPAppRender.h"
 #include "ZEPAppSettingsFile.h"
+#include "ZEPAppSettingsRules.h"
 #include "ZEPAppSketcher.h"
 
 #include <CLI/CLI.hpp>
@@ -56,22 +57,35 @@ public:
     ZEPDlgDriver::Idle();
   }
 
-  // Loads the files. A faulty file is reported; a command that writes stops there.
+  // Loads the files. Values that are not used are reported; a faulty file is reported and a
+  // command that writes stops there (a faulty administrator's file stops every write).
   int Start(const Request& iRequest, bool iWrites) {
     _paths = ResolveSettingsPaths(iRequest.settings, iRequest.admin);
+    _file.SetRules(AppSettingRules());
     const long rc = _file.Load(_paths.user, _paths.admin);
     for (const std::string& name : AppRepositories())
       _file.OpenSettings(name);
     ApplyDefaults();
     _pRoot = std::make_unique<ZEPDlgWindow>(nullptr, "DraftingOptions", 0);
+    for (const ZEPAppFileError& w : _file.LoadWarnings())
+      _err << "warning: " << w.Text() << "\n";
     if (SUCCEEDED(rc)) return kExitOk;
+    // A file that cannot be read at all (a FIFO, a device, too large) is not shown around.
+    bool userFaulty = false, unreadable = false;
+    for (const ZEPAppFileError& e : _file.LoadErrors()) {
+      userFaulty = userFaulty || e.path == _paths.user;
+      unreadable = unreadable || e.unreadable;
+    }
     for (const ZEPAppFileError& e : _file.LoadErrors())
-      _err << (iWrites ? "error: " : "warning: ") << e.Text() << "\n";
-    if (iWrites) {
+      _err << (iWrites || unreadable ? "error: " : "warning: ") << e.Text() << "\n";
+    if (iWrites || unreadable) {
       _err << "error: nothing was changed; correct or remove the faulty file, then try again\n";
       return kExitFile;
     }
-    _err << "warning: the values shown leave the faulty file out\n";
+    if (userFaulty) _err << "warning: the values shown leave the faulty file out\n";
+    if (_file.AdminFault())
+      _err << "warning: no change is accepted until the administrator's file is corrected; the locks "
+              "shown are those that could be read\n";
     return kExitOk;
   }
 
@@ -418,7 +432,8 @@ int Render(const Request& iRequest, std::ostream& out, std::ostream& err) {
     return kExitUsage;
   }
   ZEPAppRenderContext context{session.Paths().user, session.Paths().admin,
-                              std::string(kAppName) + " " + kAppVersion};
+                              std::string(kAppName) + " " + kAppVersion,
+                              session.File().AdminFault() ? session.File().AdminFault()->Text() : ""};
   const std::string html = RenderHtml(rendered, context);
   if (iRequest.html == "-") {
     out << html;
@@ -450,7 +465,8 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
                      ", else $XDG_CONFIG_HOME or ~/.config, drafting-options/settings.json)");
   app.add_option("--admin", r.admin,
                  "The administrator's settings file: defaults and locks (default: $" +
-                     std::string(kAdminFileEnv) + ", else none)");
+                     std::string(kAdminFileEnv) + ", else drafting-options/admin.json in $XDG_CONFIG_DIRS, "
+                     "/etc/xdg by default)");
   auto rangeOption = [&r](CLI::App* cmd) {
     cmd->add_option("--range", r.range, "Grid page: the scale range to work on, 1 to 5")
         ->check(CLI::Range(1, 5));

@@ -292,6 +292,10 @@ std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages,
   out += "<div class=\"titlebar\"><span class=\"icon\"></span>Options &#8211; Drafting<span "
          "class=\"close\">"
          "&#10005;</span></div>\n<div class=\"body\">\n";
+  if (!iContext.adminFault.empty())
+    out += "<p class=\"note\" role=\"alert\" style=\"color:#a00000;font-weight:600\">The administrator&#39;s "
+           "settings cannot be read, so no change is accepted until they are corrected: " +
+           EscapeHtml(iContext.adminFault) + "</p>\n";
   bool first = true;
   for (const ZEPAppRenderPage& p : iPages) {
     out += "<input class=\"tab\" type=\"radio\" name=\"page\" id=\"tab-" + EscapeHtml(p.name) +

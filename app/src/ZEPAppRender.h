@@ -28,6 +28,7 @@ struct ZEPAppRenderContext {
   std::string settingsPath; // shown in the footer; empty: none
   std::string adminPath;
   std::string generator; // "drafting-options 0.1.0"
+  std::string adminFault; // the administrator's file could not be read: shown as a banner
 };
 
 // The whole document. The first page is the tab shown first; no script, no external resource.

@@ -8,7 +8,9 @@
 #include <functional>
 #include <iterator>
 #include <optional>
+#include <map>
 #include <set>
+#include <tuple>
 #include <system_error>
 #include <utility>
 
@@ -36,39 +38,33 @@ std::string HomeFolder() {
   return pw && pw->pw_dir ? pw->pw_dir : "";
 }
 
-// The file's bytes; a missing file is no error (first run) and answers oExists false.
-bool ReadWholeFile(const std::string& iPath, std::string& oText, bool& oExists, ZEPAppFileError& oError) {
-  oText.clear();
-  oExists = false;
-  oError = ZEPAppFileError{iPath, 0, 0, ""};
-  std::error_code ec;
-  fs::file_status st = fs::status(iPath, ec);
-  if (st.type() == fs::file_type::not_found) return true;
-  if (ec) {
-    oError.message = "cannot read: " + ec.message();
-    return false;
+// Only regular files are read, and at most kMaxFileSize bytes of them.
+bool ReadFile(const std::string& iPath, std::string& oText, bool& oExists, ZEPAppFileError& oError) {
+  oError = ZEPAppFileError{iPath, 0, 0, "", true};
+  return ReadRegularFile(iPath, kMaxFileSize, oText, oExists, oError.message);
+}
+
+const char* const kTypeNames[] = {"double", "int", "unsigned"};
+
+// The system-wide administrator's file: the first folder of $XDG_CONFIG_DIRS that has one,
+// else where the first folder would hold it.
+std::string SystemAdminFile() {
+  std::string dirs = Env("XDG_CONFIG_DIRS");
+  if (dirs.empty()) dirs = "/etc/xdg";
+  std::string first;
+  std::size_t from = 0;
+  while (from <= dirs.size()) {
+    std::size_t to = dirs.find(':', from);
+    if (to == std::string::npos) to = dirs.size();
+    const std::string dir = dirs.substr(from, to - from);
+    from = to + 1;
+    if (dir.empty() || dir[0] != '/') continue; // XDG asks to ignore relative folders
+    const std::string file = dir + "/" + kAdminFileName;
+    std::error_code ec;
+    if (fs::exists(fs::symlink_status(file, ec))) return file;
+    if (first.empty()) first = file;
   }
-  oExists = true;
-  if (st.type() == fs::file_type::directory) {
-    oError.message = "is a folder, expected a settings file";
-    return false;
-  }
-  std::uintmax_t size = fs::file_size(iPath, ec);
-  if (!ec && size > kMaxFileSize) {
-    oError.message = "is " + std::to_string(size) + " bytes long, too large for a settings file";
-    return false;
-  }
-  std::ifstream in(iPath, std::ios::binary);
-  if (!in) {
-    oError.message = std::string("cannot open: ") + std::strerror(errno ? errno : EIO);
-    return false;
-  }
-  oText.assign(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
-  if (in.bad()) {
-    oError.message = "cannot read: input error";
-    return false;
-  }
-  return true;
+  return first.empty() ? std::string("/etc/xdg/") + kAdminFileName : first;
 }
 
 ZEPSysSettingRepository* Find(ZEPAppRepoKind iKind, const std::string& iName) {
@@ -97,6 +93,7 @@ ZEPAppSettingsPaths ResolveSettingsPaths(const std::string& iUserOption, const s
     if (!base.empty()) paths.user = base + "/drafting-options/settings.json";
   }
   paths.admin = !iAdminOption.empty() ? iAdminOption : Env(kAdminFileEnv);
+  if (paths.admin.empty()) paths.admin = SystemAdminFile();
   return paths;
 }
 
@@ -111,21 +108,32 @@ std::string CurrentUserName() {
 
 // ---- the store --------------------------------------------------------------------------------
 struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
+  using RepoKey = std::pair<ZEPAppRepoKind, std::string>;
+  using AttrKey = std::tuple<ZEPAppRepoKind, std::string, std::string>;
+
   // One settings file as last read or written.
   struct File {
     std::string path;
     ZEPAppSettingsDoc doc;
-    std::string bytes;  // what the file holds, to skip writes that change nothing
+    std::string bytes; // what the file holds
     bool onDisk = false;
     std::optional<ZEPAppFileError> fault; // set when it could not be read: never written then
+    std::set<AttrKey> unusable;           // values reported and not applied
   };
 
   std::shared_ptr<ZEPAppFileOps> ops;
   File user, admin;
   std::string adminWhere; // absolute path shown in lock texts
-  std::vector<ZEPAppFileError> loadErrors;
+  std::vector<ZEPAppFileError> loadErrors, loadWarnings;
   std::string lastError;
-  std::set<std::pair<ZEPAppRepoKind, std::string>> bound;
+  std::set<RepoKey> bound;
+  std::map<AttrKey, ZEPAppAttrRule> rules;
+  std::set<RepoKey> ruled; // repositories some rule names
+  int lockTimeoutMs = kLockTimeoutMs;
+  // The user's values each repository was given from the file, and attributes reset since:
+  // a save writes only what differs from them, over what the file holds then.
+  std::map<RepoKey, std::map<std::string, ZEPAppValue>> baseline;
+  std::map<RepoKey, std::set<std::string>> erased;
 
   long Fail(std::string iWhy) {
     lastError = std::move(iWhy);
@@ -136,37 +144,122 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     return "Locked by " + (iWho.empty() ? std::string("an administrator") : iWho) + " in " + adminWhere;
   }
 
-  void LoadFile(File& ioFile, bool iAdmin) {
-    if (ioFile.path.empty()) return;
+  const ZEPAppAttrEntry* AdminEntry(ZEPAppRepoKind iKind, const std::string& iRepo, const std::string& iAttr) const {
+    const auto& repos = admin.doc.Of(iKind);
+    auto repo = repos.find(iRepo);
+    if (repo == repos.end()) return nullptr;
+    auto it = repo->second.find(iAttr);
+    return it == repo->second.end() ? nullptr : &it->second;
+  }
+
+  // Why iValue cannot be the value of the attribute; empty when it can.
+  std::string Verdict(const ZEPAppAttrRule& iRule, const ZEPAppValue& iValue) const {
+    if (iValue.index() != iRule.type && iRule.type < std::size(kTypeNames))
+      return std::string("holds \"") + kTypeNames[iValue.index()] + "\" values, expected \"" +
+             kTypeNames[iRule.type] + "\"";
+    const std::size_t n = std::visit([](const auto& v) { return v.size(); }, iValue);
+    if (n != iRule.count)
+      return "holds " + std::to_string(n) + (n == 1 ? " value" : " values") + ", expected " +
+             std::to_string(iRule.count);
+    return iRule.check ? iRule.check(iValue) : std::string();
+  }
+
+  // Checks what a file that parsed holds against the rules and the locks, notes the values not
+  // to apply and answers what it found, in text order.
+  std::vector<ZEPAppFileError> CheckValues(File& ioFile, bool iAdmin) {
+    ioFile.unusable.clear();
+    std::vector<ZEPAppPlacedMessage> found;
+    for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference}) {
+      const char* section = kind == ZEPAppRepoKind::Setting ? "settings" : "preferences";
+      for (const auto& [repo, entries] : ioFile.doc.Of(kind)) {
+        const bool isRuled = ruled.count({kind, repo}) != 0;
+        for (const auto& [attr, entry] : entries) {
+          const std::string where = std::string(section) + "/" + repo + "/" + attr;
+          auto rule = rules.find({kind, repo, attr});
+          if (isRuled && rule == rules.end()) {
+            found.push_back({JsonPointer({section, repo, attr}), true,
+                             where + ": unknown attribute; nothing reads it" +
+                                 (iAdmin ? ", so neither its value nor its lock applies" : "")});
+            ioFile.unusable.insert({kind, repo, attr});
+            continue;
+          }
+          if (!entry.value) continue;
+          std::string why = rule == rules.end() ? std::string() : Verdict(rule->second, *entry.value);
+          const ZEPAppAttrEntry* byAdmin = iAdmin ? nullptr : AdminEntry(kind, repo, attr);
+          if (why.empty() && byAdmin && byAdmin->locked)
+            why = "is locked (" + LockText(byAdmin->by) + "); this value is ignored";
+          else if (!why.empty())
+            why += iAdmin ? (entry.locked ? "; the lock holds at the application's default" : "; not used")
+                          : (byAdmin && byAdmin->value ? "; the administrator's value is used instead"
+                                                       : "; the default is used instead");
+          if (why.empty()) continue;
+          found.push_back({JsonPointer({section, repo, attr, kTypeNames[entry.value->index()]}), false,
+                           where + ": " + why});
+          ioFile.unusable.insert({kind, repo, attr});
+        }
+      }
+    }
+    std::vector<ZEPAppFileError> placed = PlaceMessages(ioFile.bytes, ioFile.path, found);
+    std::stable_sort(placed.begin(), placed.end(), [](const ZEPAppFileError& a, const ZEPAppFileError& b) {
+      return std::tie(a.line, a.column) < std::tie(b.line, b.column);
+    });
+    // For the administrator's file these are faults: a lock must not silently vanish.
+    if (iAdmin && !placed.empty() && !ioFile.fault) ioFile.fault = placed.front();
+    return placed;
+  }
+
+  // Reads and parses one file into ioFile. False with the faults when it could not be read.
+  bool ReadInto(File& ioFile, bool iAdmin, std::vector<ZEPAppFileError>& oFaults) {
+    ioFile.doc = ZEPAppSettingsDoc();
+    ioFile.bytes.clear();
+    ioFile.fault.reset();
     try {
       ZEPAppFileError err;
-      if (!ReadWholeFile(ioFile.path, ioFile.bytes, ioFile.onDisk, err)) {
-        ioFile.fault = err;
-        loadErrors.push_back(err);
-        return;
-      }
-      std::vector<ZEPAppFileError> faults = ParseSettingsText(ioFile.bytes, ioFile.path, iAdmin, ioFile.doc);
-      if (!faults.empty()) {
-        ioFile.fault = faults.front();
-        loadErrors.insert(loadErrors.end(), faults.begin(), faults.end());
+      if (!ReadFile(ioFile.path, ioFile.bytes, ioFile.onDisk, err)) {
+        oFaults.push_back(err);
+      } else {
+        std::vector<ZEPAppFileError> faults = ParseSettingsText(ioFile.bytes, ioFile.path, iAdmin, ioFile.doc);
+        oFaults.insert(oFaults.end(), faults.begin(), faults.end());
       }
     } catch (const std::exception& ex) { // out of memory and the like: still a report, not a crash
-      ioFile.fault = ZEPAppFileError{ioFile.path, 0, 0, std::string("cannot be read: ") + ex.what()};
-      loadErrors.push_back(*ioFile.fault);
+      oFaults.push_back(ZEPAppFileError{ioFile.path, 0, 0, std::string("cannot be read: ") + ex.what(), true});
     }
-    // A faulty file contributes nothing rather than half of itself.
-    if (ioFile.fault) ioFile.doc = ZEPAppSettingsDoc();
+    if (oFaults.empty()) return true;
+    ioFile.fault = oFaults.front();
+    // A faulty user's file contributes nothing rather than half of itself; the readable part of
+    // an administrator's file keeps its locks.
+    if (!iAdmin) ioFile.doc = ZEPAppSettingsDoc();
+    return false;
+  }
+
+  void LoadFile(File& ioFile, bool iAdmin) {
+    if (ioFile.path.empty()) return;
+    std::vector<ZEPAppFileError> faults;
+    const bool read = ReadInto(ioFile, iAdmin, faults);
+    loadErrors.insert(loadErrors.end(), faults.begin(), faults.end());
+    if (!read && !iAdmin) return;
+    std::vector<ZEPAppFileError> found = CheckValues(ioFile, iAdmin);
+    auto& out = iAdmin ? loadErrors : loadWarnings; // the user's file: warnings, the default shows
+    out.insert(out.end(), found.begin(), found.end());
   }
 
   // Puts the files' content for one repository into it.
   void Apply(ZEPAppRepoKind iKind, ZEPSysSettingRepository& ioRepo) {
+    std::map<std::string, ZEPAppValue>& applied = baseline[{iKind, ioRepo.GetName()}];
+    applied.clear();
     const auto& users = user.doc.Of(iKind);
     if (auto it = users.find(ioRepo.GetName()); it != users.end())
       for (const auto& [attr, entry] : it->second)
-        if (entry.value) ioRepo.SetUserValue(attr, *entry.value);
+        if (entry.value && !user.unusable.count({iKind, ioRepo.GetName(), attr})) {
+          ioRepo.SetUserValue(attr, *entry.value);
+          applied[attr] = *entry.value;
+        }
     const auto& admins = admin.doc.Of(iKind);
     if (auto it = admins.find(ioRepo.GetName()); it != admins.end())
-      for (const auto& [attr, entry] : it->second) ApplyAdmin(ioRepo, attr, entry);
+      for (const auto& [attr, entry] : it->second) {
+        if (!admin.unusable.count({iKind, ioRepo.GetName(), attr})) ApplyAdmin(ioRepo, attr, entry);
+        else if (entry.locked) ApplyAdmin(ioRepo, attr, ZEPAppAttrEntry{std::nullopt, true, entry.by});
+      }
   }
 
   void ApplyAdmin(ZEPSysSettingRepository& ioRepo, const std::string& iAttr, const ZEPAppAttrEntry& iEntry) {
@@ -191,7 +284,38 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     return repo;
   }
 
-  // The save handler: this repository's values as they are now, the others as last saved.
+  // Writes are refused while the administrator's file cannot be trusted.
+  bool AdminTrusted() {
+    if (!admin.fault) return true;
+    Fail("nothing is written while the administrator's file cannot be read (" + admin.fault->Text() +
+         "): its locks would not be sure to hold; have it corrected");
+    return false;
+  }
+
+  // Locks the file, then reads it again: what other processes saved meanwhile is kept.
+  bool LockAndReread(File& ioFile, bool iAdmin, ZEPAppFileLock& oLock) {
+    std::string target, err;
+    if (!ResolveLinks(ioFile.path, target, err) || !oLock.Acquire(target, lockTimeoutMs, err)) {
+      Fail(err);
+      return false;
+    }
+    RemoveStaleTemporaries(target);
+    std::vector<ZEPAppFileError> faults;
+    if (!ReadInto(ioFile, iAdmin, faults)) {
+      Fail(ioFile.path + " is not changed because it could not be read (" + faults.front().Text() +
+           "); correct or remove it");
+      return false;
+    }
+    const std::vector<ZEPAppFileError> found = CheckValues(ioFile, iAdmin);
+    if (iAdmin && !found.empty()) {
+      Fail(ioFile.path + " is not changed because it holds a fault (" + found.front().Text() + "); correct it first");
+      return false;
+    }
+    return true;
+  }
+
+  // The save handler: the attributes of this repository changed by this run, written over what
+  // the file holds now.
   long SaveUser(ZEPAppRepoKind iKind, const ZEPSysSettingRepository& iRepo) {
     lastError.clear();
     if (user.path.empty())
@@ -200,12 +324,32 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     if (user.fault)
       return Fail(user.path + " is not saved because it could not be read (" + user.fault->Text() +
                   "); correct or remove it");
+    if (!AdminTrusted()) return E_FAIL;
+    const RepoKey key{iKind, iRepo.GetName()};
+    const std::map<std::string, ZEPAppValue>& before = baseline[key];
+    const std::map<std::string, ZEPAppValue>& now = iRepo.UserValues();
+    std::map<std::string, std::optional<ZEPAppValue>> changes;
+    for (const auto& [attr, value] : now)
+      if (auto it = before.find(attr); it == before.end() || !(it->second == value)) changes[attr] = value;
+    for (const auto& [attr, value] : before)
+      if (!now.count(attr)) changes[attr] = std::nullopt;
+    for (const std::string& attr : erased[key])
+      if (!now.count(attr)) changes[attr] = std::nullopt;
+    if (changes.empty()) return S_OK;
+
+    ZEPAppFileLock lock;
+    if (!LockAndReread(user, false, lock)) return E_FAIL;
     ZEPAppSettingsDoc next = user.doc;
-    ZEPAppRepoEntries entries;
-    for (const auto& [attr, value] : iRepo.UserValues()) entries[attr].value = value;
+    ZEPAppRepoEntries& entries = next.Of(iKind)[iRepo.GetName()];
+    for (const auto& [attr, value] : changes) {
+      if (value) entries[attr].value = *value;
+      else entries.erase(attr);
+    }
     if (entries.empty()) next.Of(iKind).erase(iRepo.GetName());
-    else next.Of(iKind)[iRepo.GetName()] = std::move(entries);
-    return Write(user, std::move(next), false);
+    if (long rc = Write(user, std::move(next), false); FAILED(rc)) return rc;
+    baseline[key] = now;
+    erased[key].clear();
+    return S_OK;
   }
 
   long Write(File& ioFile, ZEPAppSettingsDoc&& iNext, bool iAdmin) {
@@ -221,6 +365,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
   }
 
   // Changes one entry of the administrator's file, writes it, then shows it in the repository.
+  // iEdit answers S_OK to write, or a success code other than S_OK when nothing is to change.
   template <class Edit>
   long EditAdmin(ZEPAppRepoKind iKind, const std::string& iRepo, const std::string& iAttr, Edit iEdit) {
     lastError.clear();
@@ -231,9 +376,16 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
       return Fail(admin.path + " is not changed because it could not be read (" + admin.fault->Text() +
                   "); correct it first");
     ZEPSysSettingRepository* repo = Bind(iKind, iRepo, false);
+    ZEPAppFileLock lock;
+    if (!LockAndReread(admin, true, lock)) return E_FAIL;
     ZEPAppSettingsDoc next = admin.doc;
     ZEPAppAttrEntry& entry = next.Of(iKind)[iRepo][iAttr];
-    iEdit(entry, *repo);
+    if (long rc = iEdit(entry, *repo); rc != S_OK) return rc;
+    if (entry.value) {
+      auto rule = rules.find({iKind, iRepo, iAttr});
+      std::string why = rule == rules.end() ? std::string() : Verdict(rule->second, *entry.value);
+      if (!why.empty()) return Fail(std::string(SectionName(iKind)) + "/" + iRepo + "/" + iAttr + ": " + why);
+    }
     const ZEPAppAttrEntry applied = entry;
     if (EntryEmpty(entry)) next.Of(iKind)[iRepo].erase(iAttr);
     if (next.Of(iKind)[iRepo].empty()) next.Of(iKind).erase(iRepo);
@@ -242,20 +394,36 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     return S_OK;
   }
 
-  long Save(ZEPSysSettingRepository& ioRepo) {
+  long Save(ZEPAppRepoKind iKind, ZEPSysSettingRepository& ioRepo) {
     lastError.clear();
-    long rc = ioRepo.SaveRepository();
+    // A reset of a value the file holds but the repository never took changes only the file.
+    const bool pending = !erased[{iKind, ioRepo.GetName()}].empty();
+    long rc = pending ? SaveUser(iKind, ioRepo) : ioRepo.SaveRepository();
+    if (pending && SUCCEEDED(rc)) rc = ioRepo.SaveRepository();
     if (FAILED(rc) && lastError.empty()) lastError = ioRepo.GetName() + ": the save failed";
     return rc;
   }
 
+  // Marks the user's entries of an attribute for removal at the next save.
+  void Erase(ZEPAppRepoKind iKind, const std::string& iRepo, const std::string& iAttr) {
+    const auto& repos = user.doc.Of(iKind);
+    auto it = repos.find(iRepo);
+    if (it != repos.end() && it->second.count(iAttr)) erased[{iKind, iRepo}].insert(iAttr);
+  }
+
   long ResetRepository(ZEPAppRepoKind iKind, const std::string& iRepo) {
     ZEPSysSettingRepository* repo = Bind(iKind, iRepo, false);
-    std::vector<std::string> names;
-    for (const auto& [attr, value] : repo->UserValues())
-      if (!repo->IsLocked(attr)) names.push_back(attr);
-    for (const std::string& attr : names) repo->ResetAttr(attr);
-    return Save(*repo);
+    std::set<std::string> names;
+    for (const auto& [attr, value] : repo->UserValues()) names.insert(attr);
+    const auto& repos = user.doc.Of(iKind);
+    if (auto it = repos.find(iRepo); it != repos.end())
+      for (const auto& [attr, entry] : it->second) names.insert(attr);
+    for (const std::string& attr : names) {
+      if (repo->IsLocked(attr)) continue;
+      repo->ResetAttr(attr);
+      Erase(iKind, iRepo, attr);
+    }
+    return Save(iKind, *repo);
   }
 };
 
@@ -265,19 +433,34 @@ ZEPAppSettingsFile::ZEPAppSettingsFile(std::shared_ptr<ZEPAppFileOps> iOps) : _p
 
 ZEPAppSettingsFile::~ZEPAppSettingsFile() = default;
 
+void ZEPAppSettingsFile::SetRules(std::vector<ZEPAppAttrRule> iRules) {
+  Impl& d = *_pImpl;
+  d.rules.clear();
+  d.ruled.clear();
+  for (ZEPAppAttrRule& r : iRules) {
+    d.ruled.emplace(r.kind, r.repository);
+    Impl::AttrKey key{r.kind, r.repository, r.attribute};
+    d.rules.emplace(std::move(key), std::move(r));
+  }
+}
+
+void ZEPAppSettingsFile::SetLockTimeout(int iMilliseconds) { _pImpl->lockTimeoutMs = iMilliseconds; }
+
 long ZEPAppSettingsFile::Load(const std::string& iUserPath, const std::string& iAdminPath) {
   Impl& d = *_pImpl;
   d.lastError.clear();
   d.loadErrors.clear();
-  d.user = Impl::File{iUserPath, {}, {}, false, std::nullopt};
-  d.admin = Impl::File{iAdminPath, {}, {}, false, std::nullopt};
+  d.loadWarnings.clear();
+  d.erased.clear();
+  d.user = Impl::File{iUserPath, {}, {}, false, std::nullopt, {}};
+  d.admin = Impl::File{iAdminPath, {}, {}, false, std::nullopt, {}};
   std::error_code ec;
   d.adminWhere = iAdminPath.empty() ? "" : fs::absolute(iAdminPath, ec).lexically_normal().string();
   if (d.adminWhere.empty()) d.adminWhere = iAdminPath;
   d.LoadFile(d.admin, true);
   d.LoadFile(d.user, false);
 
-  std::set<std::pair<ZEPAppRepoKind, std::string>> names = d.bound;
+  std::set<Impl::RepoKey> names = d.bound;
   for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference})
     for (const Impl::File* f : {&d.admin, &d.user})
       for (const auto& repo : f->doc.Of(kind)) names.emplace(kind, repo.first);
@@ -288,6 +471,10 @@ long ZEPAppSettingsFile::Load(const std::string& iUserPath, const std::string& i
 }
 
 const std::vector<ZEPAppFileError>& ZEPAppSettingsFile::LoadErrors() const { return _pImpl->loadErrors; }
+const std::vector<ZEPAppFileError>& ZEPAppSettingsFile::LoadWarnings() const { return _pImpl->loadWarnings; }
+const ZEPAppFileError* ZEPAppSettingsFile::AdminFault() const {
+  return _pImpl->admin.fault ? &*_pImpl->admin.fault : nullptr;
+}
 
 ZEPSysSettingRepository* ZEPAppSettingsFile::OpenSettings(const std::string& iName) {
   return _pImpl->Bind(ZEPAppRepoKind::Setting, iName, false);
@@ -304,7 +491,7 @@ long ZEPAppSettingsFile::SaveAll() {
   for (const auto& [kind, name] : d.bound) {
     ZEPSysSettingRepository* repo = Find(kind, name);
     if (!repo) continue;
-    long rc = d.Save(*repo);
+    long rc = d.Save(kind, *repo);
     if (FAILED(rc) && SUCCEEDED(result)) {
       result = rc;
       firstError = d.lastError;
@@ -320,6 +507,7 @@ long ZEPAppSettingsFile::Lock(const std::string& iRepository, const std::string&
     if (const ZEPAppValue* now = r.Effective(iAttribute)) e.value = *now;
     e.locked = true;
     e.by = who;
+    return S_OK;
   });
 }
 
@@ -331,29 +519,28 @@ long ZEPAppSettingsFile::Lock(const std::string& iRepository, const std::string&
     e.value = iValue;
     e.locked = true;
     e.by = who;
+    return S_OK;
   });
 }
 
 long ZEPAppSettingsFile::Unlock(const std::string& iRepository, const std::string& iAttribute, ZEPAppRepoKind iKind) {
   Impl& d = *_pImpl;
-  const auto& repos = d.admin.doc.Of(iKind);
-  auto repo = repos.find(iRepository);
-  bool locked = repo != repos.end() && repo->second.count(iAttribute) && repo->second.at(iAttribute).locked;
-  if (!locked && !d.admin.path.empty() && !d.admin.fault) {
-    d.lastError.clear();
-    return 1;
-  }
-  return d.EditAdmin(iKind, iRepository, iAttribute, [](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) {
+  // Whether it is locked is decided on the file as read under its lock.
+  return d.EditAdmin(iKind, iRepository, iAttribute, [](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) -> long {
+    if (!e.locked) return 1;
     e.locked = false;
     e.by.clear();
+    return S_OK;
   });
 }
 
 long ZEPAppSettingsFile::SetAdminDefault(const std::string& iRepository, const std::string& iAttribute,
                                          const ZEPAppValue& iValue, ZEPAppRepoKind iKind) {
   if (!IsFinite(iValue)) return _pImpl->Fail(iAttribute + ": NaN and infinities cannot be stored");
-  return _pImpl->EditAdmin(iKind, iRepository, iAttribute,
-                           [&](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) { e.value = iValue; });
+  return _pImpl->EditAdmin(iKind, iRepository, iAttribute, [&](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) {
+    e.value = iValue;
+    return S_OK;
+  });
 }
 
 long ZEPAppSettingsFile::Reset(const std::string& iRepository, const std::string& iAttribute, ZEPAppRepoKind iKind) {
@@ -367,7 +554,8 @@ long ZEPAppSettingsFile::Reset(const std::string& iRepository, const std::string
                   " cannot be reset: " + info.GetLockText());
   }
   repo->ResetAttr(iAttribute);
-  return d.Save(*repo);
+  d.Erase(iKind, iRepository, iAttribute);
+  return d.Save(iKind, *repo);
 }
 
 long ZEPAppSettingsFile::ResetAll(const std::string& iRepository, ZEPAppRepoKind iKind) {
@@ -377,7 +565,7 @@ long ZEPAppSettingsFile::ResetAll(const std::string& iRepository, ZEPAppRepoKind
 
 long ZEPAppSettingsFile::ResetAll() {
   Impl& d = *_pImpl;
-  std::set<std::pair<ZEPAppRepoKind, std::string>> names = d.bound;
+  std::set<Impl::RepoKey> names = d.bound;
   for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference})
     for (const auto& repo : d.user.doc.Of(kind)) names.emplace(kind, repo.first);
   long result = S_OK;

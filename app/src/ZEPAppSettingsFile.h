@@ -6,6 +6,7 @@
 #include "ZEPAppSettingsFormat.h"
 #include "ZEPSettings.h"
 
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -14,17 +15,35 @@ namespace zepapp {
 
 inline constexpr const char* kSettingsFileEnv = "DRAFTING_OPTIONS_SETTINGS";
 inline constexpr const char* kAdminFileEnv = "DRAFTING_OPTIONS_ADMIN";
+inline constexpr const char* kAdminFileName = "drafting-options/admin.json"; // under each $XDG_CONFIG_DIRS folder
+
+// How long a save waits for another process's save of the same file.
+inline constexpr int kLockTimeoutMs = 5000;
 
 struct ZEPAppSettingsPaths {
   std::string user;  // empty only when no home or config folder is known
-  std::string admin; // empty: no administrator's file
+  std::string admin; // never empty from ResolveSettingsPaths: the system-wide file at least
 };
 
 // Where the files are. The user's file: iUserOption, else $DRAFTING_OPTIONS_SETTINGS, else
 // ($XDG_CONFIG_HOME or ~/.config)/drafting-options/settings.json. The administrator's file:
-// iAdminOption (--admin FILE), else $DRAFTING_OPTIONS_ADMIN, else none. Empty options and
-// variables count as not given.
+// iAdminOption (--admin FILE), else $DRAFTING_OPTIONS_ADMIN, else the system-wide
+// drafting-options/admin.json of the first folder of $XDG_CONFIG_DIRS (default /etc/xdg) that
+// has one, else of the first folder. Empty options and variables count as not given, so that
+// leaving one out never drops the system-wide locks.
 ZEPAppSettingsPaths ResolveSettingsPaths(const std::string& iUserOption = "", const std::string& iAdminOption = "");
+
+// What a stored value must be to be used: its kind and count from the settings table and the
+// limits of the control that shows it.
+struct ZEPAppAttrRule {
+  ZEPAppRepoKind kind = ZEPAppRepoKind::Setting;
+  std::string repository, attribute;
+  std::size_t type = 0;  // index of the alternative in ZEPAppValue: 0 double, 1 int, 2 unsigned
+  std::size_t count = 1; // how many values
+  // Why a value of the right kind and count is refused; empty when it is accepted. May be
+  // left empty: no limits.
+  std::function<std::string(const ZEPAppValue&)> check;
+};
 
 // The login name that a lock records as its author.
 std::string CurrentUserName();
@@ -41,17 +60,34 @@ public:
   ZEPAppSettingsFile(const ZEPAppSettingsFile&) = delete;
   ZEPAppSettingsFile& operator=(const ZEPAppSettingsFile&) = delete;
 
+  // The rules the files' values are checked against when read. Repositories that no rule names
+  // take any attribute; in those a rule names, an attribute without a rule is reported.
+  void SetRules(std::vector<ZEPAppAttrRule> iRules);
+  // How long a save waits for the lock of its file; kLockTimeoutMs unless changed.
+  void SetLockTimeout(int iMilliseconds);
+
   // Reads both files into the repositories (a missing file is an empty one) and installs the
   // save handlers. iAdminPath empty: no administrator's file. E_FAIL when a file could not be
-  // read; LoadErrors() then tells where, everything of the other file is still applied, and the
-  // faulty file is never written.
+  // read; LoadErrors() then tells where and the faulty file is never written. A faulty user's
+  // file contributes nothing. A faulty administrator's file stops every write, its own and the
+  // user's (locks fail closed); what could be read of it still applies, locks included.
   long Load(const std::string& iUserPath, const std::string& iAdminPath = "");
   const std::vector<ZEPAppFileError>& LoadErrors() const;
+  // Values of the user's file that are not used (wrong kind or count, outside the control's
+  // limits, locked, unknown attribute): the default or the administrator's value shows
+  // instead. They stay in the file until the user changes that setting.
+  const std::vector<ZEPAppFileError>& LoadWarnings() const;
+  // The first fault of the administrator's file; null when it could be read.
+  const ZEPAppFileError* AdminFault() const;
 
   // The registered repository (opened when needed), filled from the files when it is new.
   ZEPSysSettingRepository* OpenSettings(const std::string& iName);
   ZEPSysPreferenceRepository* OpenPreferences(const std::string& iName);
 
+  // Saves are read-modify-write under the lock of the file (ZEPAppFileLock): the file is read
+  // again under the lock and only the attributes this run changed are applied to it, so that
+  // concurrent runs changing other attributes lose nothing. A save that cannot get the lock
+  // in time writes nothing and fails.
   // SaveRepository of every repository bound to the files; the first failure is kept.
   long SaveAll();
 

@@ -430,7 +430,7 @@ std::vector<ZEPAppFileError> ParseSettingsText(const std::string& iText, const s
       Checker checker(Locate(iText), iAdmin);
       checker.Document(root, doc);
       faults = std::move(checker.Faults());
-      if (faults.empty()) oDoc = std::move(doc);
+      oDoc = std::move(doc);
     }
   }
 
@@ -446,6 +446,30 @@ std::vector<ZEPAppFileError> ParseSettingsText(const std::string& iText, const s
     errors.push_back(std::move(e));
   }
   return errors;
+}
+
+std::vector<ZEPAppFileError> PlaceMessages(const std::string& iText, const std::string& iPath,
+                                           const std::vector<ZEPAppPlacedMessage>& iMessages) {
+  std::vector<ZEPAppFileError> placed;
+  if (iMessages.empty()) return placed;
+  const Positions pos = Locate(iText); // one pass for all of them: only files with something to report
+  for (const ZEPAppPlacedMessage& m : iMessages) {
+    std::size_t offset = 0;
+    const auto& where = m.atKey ? pos.keys : pos.values;
+    if (auto it = where.find(m.pointer); it != where.end()) offset = it->second;
+    ZEPAppFileError e;
+    e.path = iPath;
+    LineAndColumn(iText, offset, e.line, e.column);
+    e.message = m.message;
+    placed.push_back(std::move(e));
+  }
+  return placed;
+}
+
+std::string JsonPointer(const std::vector<std::string>& iKeys) {
+  std::string pointer;
+  for (const std::string& key : iKeys) pointer += "/" + EscapePointer(key);
+  return pointer;
 }
 
 bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError) {

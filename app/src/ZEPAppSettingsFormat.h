@@ -64,6 +64,9 @@ struct ZEPAppFileError {
   int line = 0;
   int column = 0;
   std::string message;
+  // The file could not be read at all (not opened, not a regular file, too large), rather
+  // than read and found faulty.
+  bool unreadable = false;
   // "path:line:column: message", the form editors jump to.
   std::string Text() const;
 };
@@ -71,13 +74,30 @@ struct ZEPAppFileError {
 inline constexpr int kSettingsFormat = 1;
 
 // Reads iText, the content of iPath. Blank text is an empty file. Answers the faults in text
-// order (empty when oDoc is filled); at most a few dozen are kept.
+// order; at most a few dozen are kept. oDoc holds what could be read: everything when there is
+// no fault, the well-formed entries when the faults are of the format only (an entry with a
+// fault may lack its value but keeps its lock), nothing after a syntax error.
 std::vector<ZEPAppFileError> ParseSettingsText(const std::string& iText, const std::string& iPath,
                                                bool iAdmin, ZEPAppSettingsDoc& oDoc);
 
 // Writes iDoc in the form above. False with oError when something cannot be written faithfully
 // (a NaN or infinity, a name that is not UTF-8); iAdmin keeps locks, else they are left out.
 bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError);
+
+// A message about one place of a file that parsed, named by a JSON pointer
+// ("/settings/DraftingOptions/DrwViewAxisLength/double"); atKey: the member's key rather than
+// its value.
+struct ZEPAppPlacedMessage {
+  std::string pointer;
+  bool atKey = false;
+  std::string message;
+};
+// The messages with the line and column of their places (the start of the text for a place
+// that is not found), in the order given.
+std::vector<ZEPAppFileError> PlaceMessages(const std::string& iText, const std::string& iPath,
+                                           const std::vector<ZEPAppPlacedMessage>& iMessages);
+// The JSON pointer of nested keys.
+std::string JsonPointer(const std::vector<std::string>& iKeys);
 
 // Line and column (1-based, characters) of a byte offset of iText.
 void LineAndColumn(const std::string& iText, std::size_t iOffset, int& oLine, int& oColumn);

@@ -51,6 +51,11 @@ int DragModeValue(int iValue) { return iValue >= 0 && iValue <= 2 ? iValue : 1; 
 // NaN is not greater than zero either and falls back as well.
 double Spacing(double iValue) { return iValue > 0.0 ? iValue : 100.0; }
 int Step(int iValue) { return iValue > 0 ? iValue : 10; }
+// What the sketcher may be handed: a stored spacing of 0 or less, or fewer than one graduation,
+// would break its grid, so the getters answer the range's default instead.
+bool UsableSpacing(double iValue) { return iValue > 0.0; }
+bool UsableStep(int iValue) { return iValue >= 1; }
+bool AnyFlag(int) { return true; }
 
 // ---- one int setting ----------------------------------------------------------------------------
 int ReadScalar(const ZEPSysSettingRepository* iRep, const char* iName, int iDefault,
@@ -92,7 +97,7 @@ int RangeIndex(ZEPCkeScale iRange) {
 
 template <class T>
 T ReadRange(const ZEPSysSettingRepository* iRep, const char* iName, const T (&iDefaults)[5],
-            T iNoRepository, ZEPCkeScale iRange) {
+            T iNoRepository, ZEPCkeScale iRange, bool (*iUsable)(T)) {
   if (!iRep) {
     Check_Pointer_Failed__("_pSpecificSettRep", ZEP_SK_PATH, __LINE__, nullptr);
     return iNoRepository;
@@ -100,7 +105,8 @@ T ReadRange(const ZEPSysSettingRepository* iRep, const char* iName, const T (&iD
   T values[5] = {iDefaults[0], iDefaults[1], iDefaults[2], iDefaults[3], iDefaults[4]};
   // Fewer values than five (an older single-value entry) keep the defaults of the others.
   iRep->ReadAttr(iName, values, 5);
-  return values[RangeIndex(iRange)];
+  const int i = RangeIndex(iRange);
+  return iUsable(values[i]) ? values[i] : iDefaults[i];
 }
 
 // Replaces the entry of one range and writes all five back, so that the others stay as they were.
@@ -219,18 +225,21 @@ ZEP_SK_INT_SETTINGS(ZEP_SK_DEFINE_INT)
 #undef ZEP_SK_DEFINE_INT
 
 // ---- per-range settings: stem, value type, attribute, written buffer (for the check text),
-// defaults, value without a repository, normaliser. All live in the specific repository and
-// notify a grid change.
+// defaults, value without a repository, normaliser, test of a stored value. All live in the
+// specific repository and notify a grid change.
 #define ZEP_SK_RANGE_SETTINGS(X)                                                                   \
-  X(GridPrimSpac, double, mstrGridHPrSpacing, gridSpacingH, kSpacingDefaults, 100.0, Spacing)      \
-  X(GridSecStep, int, mstrGridHSecStep, gridStepH, kStepDefaults, 10, Step)                        \
-  X(AllowDistortions, int, mstrAllowDistortions, allowDistortions, kDistortionDefaults, 0, Flag)   \
-  X(GridVPrimSpac, double, mstrGridVPrSpacing, gridSpacingV, kSpacingDefaults, 100.0, Spacing)     \
-  X(GridVSecStep, int, mstrGridVSecStep, gridStepV, kStepDefaults, 10, Step)
+  X(GridPrimSpac, double, mstrGridHPrSpacing, gridSpacingH, kSpacingDefaults, 100.0, Spacing,      \
+    UsableSpacing)                                                                                 \
+  X(GridSecStep, int, mstrGridHSecStep, gridStepH, kStepDefaults, 10, Step, UsableStep)            \
+  X(AllowDistortions, int, mstrAllowDistortions, allowDistortions, kDistortionDefaults, 0, Flag,   \
+    AnyFlag)                                                                                       \
+  X(GridVPrimSpac, double, mstrGridVPrSpacing, gridSpacingV, kSpacingDefaults, 100.0, Spacing,     \
+    UsableSpacing)                                                                                 \
+  X(GridVSecStep, int, mstrGridVSecStep, gridStepV, kStepDefaults, 10, Step, UsableStep)
 
-#define ZEP_SK_DEFINE_RANGE(Stem, T, Name, Buffer, Defaults, NoRepository, Normalise)              \
+#define ZEP_SK_DEFINE_RANGE(Stem, T, Name, Buffer, Defaults, NoRepository, Normalise, Usable)      \
   T ZEP2DBaseSketcherSettingsAdapt::Get##Stem(ZEPCkeScale iRange) {                                \
-    return ReadRange<T>(_pSpecificSettRep, Name, Defaults, NoRepository, iRange);                  \
+    return ReadRange<T>(_pSpecificSettRep, Name, Defaults, NoRepository, iRange, Usable);          \
   }                                                                                                \
   void ZEP2DBaseSketcherSettingsAdapt::Set##Stem(T iValue, int iNotify, ZEPCkeScale iRange) {      \
     if (WriteRange<T>(_pSpecificSettRep, Name, Defaults, Normalise(iValue), iRange,                \

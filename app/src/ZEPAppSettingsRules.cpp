@@ -1,0 +1,153 @@
+#include "ZEPAppSettingsRules.h"
+
+#include "ZEPAppPages.h"
+#include "ZEPDrwSettingsServices.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+#include <map>
+#include <set>
+#include <type_traits>
+
+namespace zepapp {
+
+namespace {
+
+// Flags of the pages' tables: a check button stores 0 or 1.
+struct PageAttribute {
+  const char* page;
+  const char* attribute;
+  bool flag;
+};
+#define ZEP_SETTING(Name, Kind) {kPage, #Name, std::is_same_v<ZEP_TYPE_##Kind, unsigned char>},
+constexpr const char* kGrid = "Grid";
+constexpr const char* kGeneral = "General";
+constexpr const char* kPrimaryView = "PrimaryView";
+const PageAttribute kPageAttributes[] = {
+#define kPage kGrid
+#include "ZEP2DBaseOptGridFrm.def"
+#undef kPage
+#define kPage kGeneral
+#include "ZEP2DBaseOptGalFrm.def"
+#undef kPage
+#define kPage kPrimaryView
+#include "ZEP2DBasePrimaryViewFrm.def"
+#undef kPage
+};
+#undef ZEP_SETTING
+
+bool IsFlag(const ZEPAppSetting& iSetting) {
+  for (const PageAttribute& a : kPageAttributes)
+    if (iSetting.page == a.page && iSetting.attribute == a.attribute) return a.flag;
+  return false;
+}
+
+// The limits of the controls, by stored attribute. Lengths are millimetres at the normal scale;
+// a per-range length scales with its range as its spinner does.
+struct Limits {
+  double min, max;
+  bool minExcluded;                // a grid spacing must be more than 0
+  bool perRange;                   // the maximum follows the scale range of the value
+  std::vector<double> oneOf = {};  // a combo: the codes of its lines
+};
+const std::map<std::string, Limits>& KnownLimits() {
+  static const std::map<std::string, Limits> limits = {
+      {"DrwViewAxisLength", {0.0, 100000.0, false, false}},
+      {"DrwDefaultOffsetBetViews", {0.0, 10000.0, false, false}},
+      {"Drw_settings_GridPrimarySpacing", {0.0, 100000.0, true, true}},
+      {"Drw_settings_GridVPrimarySpacing", {0.0, 10000.0, true, true}},
+      {"Drw_settings_GridSecondaryStep", {1.0, 100000.0, false, false}},
+      {"Drw_settings_GridVSecondaryStep", {1.0, 100000.0, false, false}},
+      // The general page's unit lines: millimetre, centimetre, inch.
+      {"DrwPaperLengthUnit", {1.0, 5.0, false, false, {1.0, 3.0, 5.0}}},
+  };
+  return limits;
+}
+
+// The largest value a length spinner takes at a scale range, as the pages set it.
+double RangeMaximum(double iMax, int iRange) {
+  ZEPDlgSpinner probe(nullptr, "limitsProbe", ZEPDlgSpnDouble);
+  ZEPDrwSettingsServices::SetLengthMinMaxStep(&probe, static_cast<ZEPCkeScale>(iRange), 0, 0.0, iMax, 1.0);
+  double lo = 0, hi = iMax / 1000.0, step = 0;
+  probe.GetMinMaxStep(lo, hi, step);
+  return hi * 1000.0; // the spinner works in metres
+}
+
+std::string Accepted(const Limits& iLimits, double iMax) {
+  if (!iLimits.oneOf.empty()) {
+    std::string text = "one of";
+    for (double v : iLimits.oneOf) text += " " + FormatNumber(v);
+    return text;
+  }
+  return (iLimits.minExcluded ? "more than " : "from ") + FormatNumber(iLimits.min) + " to " + FormatNumber(iMax);
+}
+
+// Why one value is refused; empty when accepted.
+std::string Refusal(const Limits& iLimits, double iValue, double iMax) {
+  const bool ok = iLimits.oneOf.empty()
+                ? (iLimits.minExcluded ? iValue > iLimits.min : iValue >= iLimits.min) && iValue <= iMax
+                : std::find(iLimits.oneOf.begin(), iLimits.oneOf.end(), iValue) != iLimits.oneOf.end();
+  return ok ? "" : FormatNumber(iValue) + " is outside the control's limits (" + Accepted(iLimits, iMax) + ")";
+}
+
+template <class Values> std::string CheckEach(const Values& iValues, const Limits& iLimits, bool iFlag) {
+  for (std::size_t i = 0; i < iValues.size(); ++i) {
+    const double v = static_cast<double>(iValues[i]);
+    std::string why;
+    if (iFlag) {
+      if (v != 0.0 && v != 1.0) why = FormatNumber(v) + " is not a check state (0 or 1)";
+    } else {
+      const double max = iLimits.perRange ? RangeMaximum(iLimits.max, static_cast<int>(i) + 1) : iLimits.max;
+      why = Refusal(iLimits, v, max);
+    }
+    if (why.empty()) continue;
+    return iValues.size() == 1 ? why : "value " + std::to_string(i + 1) + ": " + why;
+  }
+  return "";
+}
+
+} // namespace
+
+std::string FormatNumber(double iValue) {
+  // Plain digits where people read them so, exponents for the very large and very small; the
+  // shortest digits that read back to the same double either way.
+  const double magnitude = std::fabs(iValue);
+  const bool plain = magnitude == 0.0 || (magnitude >= 1e-6 && magnitude < 1e21);
+  char buffer[128]; // a plain number below 1e21 or an exponent form needs far less
+  const auto result = std::to_chars(buffer, buffer + sizeof buffer, iValue,
+                                    plain ? std::chars_format::fixed : std::chars_format::scientific);
+  return result.ec == std::errc() ? std::string(buffer, result.ptr) : std::to_string(iValue);
+}
+
+std::vector<ZEPAppAttrRule> AppSettingRules() {
+  std::vector<ZEPAppAttrRule> rules;
+  for (const ZEPAppSetting& s : AppSettings()) {
+    const ZEPAppPage* page = nullptr;
+    for (const ZEPAppPage& p : AppPages())
+      if (p.table == s.page) page = &p;
+    ZEPAppAttrRule rule;
+    rule.repository = s.repository;
+    rule.attribute = s.stored;
+    rule.count = s.defaults.size();
+    rule.type = std::size_t(-1); // any kind when the page does not say
+    if (page)
+      if (auto kind = page->stored.find(s.attribute); kind != page->stored.end()) {
+        if (kind->second == ZEPAppStored::Double) rule.type = 0;
+        else if (kind->second == ZEPAppStored::Int) rule.type = 1;
+        else if (kind->second == ZEPAppStored::UInt) rule.type = 2;
+      }
+    const bool flag = IsFlag(s);
+    auto known = KnownLimits().find(s.stored);
+    if (flag || known != KnownLimits().end()) {
+      const Limits limits = known != KnownLimits().end() ? known->second : Limits{0, 1, false, false};
+      rule.check = [limits, flag](const ZEPAppValue& iValue) {
+        return std::visit([&](const auto& values) { return CheckEach(values, limits, flag); }, iValue);
+      };
+    }
+    rules.push_back(std::move(rule));
+  }
+  return rules;
+}
+
+} // namespace zepapp
