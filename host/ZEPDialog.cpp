@@ -2,6 +2,7 @@
 #include "ZEPSettings.h"
 
 #include <algorithm>
+#include <charconv>
 #include <cmath>
 #include <cstdio>
 #include <unordered_map>
@@ -472,23 +473,38 @@ std::string ZEPDlgControl::UnitSymbol() const {
   return u ? u->symbol : "";
 }
 
+namespace {
+// printf into a string of the size the text needs.
+template <class... A> std::string Printed(const char* iFormat, A... iArgs) {
+  const int size = std::snprintf(nullptr, 0, iFormat, iArgs...);
+  if (size <= 0) return std::string();
+  std::string text(static_cast<size_t>(size) + 1, '\0');
+  std::snprintf(text.data(), text.size(), iFormat, iArgs...);
+  text.resize(static_cast<size_t>(size));
+  return text;
+}
+} // namespace
+
 std::string ZEPDlgControl::FormatValue(double iValue) const {
-  double shown = ToDisplay(iValue);
-  char buf[64];
-  if (_precision > 0) {
-    std::snprintf(buf, sizeof buf, "%.*f", _precision > 12 ? 12 : _precision, shown);
-    std::string s = buf;
-    if (s.find('.') != std::string::npos) {
-      while (s.back() == '0') s.pop_back();
-      if (s.back() == '.') s.pop_back();
+  const double shown = ToDisplay(iValue);
+  std::string text;
+  if (_precision > 0 && std::fabs(shown) < 1e15) {
+    text = Printed("%.*f", _precision > 12 ? 12 : _precision, shown);
+    if (text.find('.') != std::string::npos) {
+      while (text.back() == '0') text.pop_back();
+      if (text.back() == '.') text.pop_back();
     }
-    if (s == "-0") s = "0";
-    std::snprintf(buf, sizeof buf, "%s", s.c_str());
+    if (text == "-0") text = "0";
+  } else if (_precision > 0) {
+    // Beyond the digits a double holds: its shortest exact form rather than made-up zeros.
+    char digits[32];
+    const auto result = std::to_chars(digits, digits + sizeof digits, shown);
+    text.assign(digits, result.ptr);
   } else {
-    std::snprintf(buf, sizeof buf, "%g", shown);
+    text = Printed("%g", shown);
   }
-  std::string sym = UnitSymbol();
-  return sym.empty() ? std::string(buf) : std::string(buf) + " " + sym;
+  const std::string sym = UnitSymbol();
+  return sym.empty() ? text : text + " " + sym;
 }
 
 ZEPDlgSpinner::ZEPDlgSpinner(ZEPDialog* iParent, const ZEPString& iName, unsigned long iStyle)

@@ -199,3 +199,30 @@ TEST_F(HostToolkit, RepositoryReadsKeepDefaultsAndLocksRefuseWrites) {
   EXPECT_EQ(rep->SaveRepository(), S_OK);
   EXPECT_EQ(saves, 2);
 }
+
+TEST_F(HostToolkit, ValuesOfAnySizeAreShownWhole) {
+  ZEPDlgSpinner spinner(&_root, "spn", 0x60000);
+  spinner.SetUnit(45); // millimetres
+  spinner.SetPrecision(3);
+  EXPECT_EQ(spinner.FormatValue(0.0125), "12.5 mm");
+  EXPECT_EQ(spinner.FormatValue(-0.0000001), "0 mm");
+  EXPECT_EQ(spinner.FormatValue(1e305), "1e+308 mm"); // not 64 bytes of made-up digits
+  EXPECT_EQ(spinner.FormatValue(123456789012.345), "123456789012345 mm");
+  spinner.SetPrecision(0);
+  EXPECT_EQ(spinner.FormatValue(0.5), "500 mm");
+}
+
+TEST_F(HostToolkit, ColourComboSelectionReachesItsOwnSubscribers) {
+  // A page subscribes on the colour combo itself, which is what the value transfer compares with.
+  struct Listener : ZEPCommand {
+    ZEPCommand* sender = nullptr;
+    void Listen(ZEPComboColor* c) {
+      AddCallback(c, c->GetComboSelectNotification(), [this](ZEPCommand* s, ZEPNotification*, void*) { sender = s; },
+                  nullptr);
+    }
+  } listener;
+  auto* colour = new ZEPComboColor(&_root, "colour", 0, 1, 2, 3, 0, 0, 0);
+  listener.Listen(colour);
+  ASSERT_TRUE(ZEPDlgDriver::SelectColor(colour, 10, 20, 30));
+  EXPECT_EQ(listener.sender, colour);
+}

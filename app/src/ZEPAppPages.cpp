@@ -107,27 +107,49 @@ const std::map<std::string, ZEPAppStored> kGeometryStored = {
 #include "ZEP2DBaseOptGeoFrm.def"
 };
 #undef ZEP_SETTING
+
+#define ZEP_SETTING(Name, Kind) ZEP_APP_FLAG_##Kind(Name)
+#define ZEP_APP_FLAG_Flag(Name) #Name,
+#define ZEP_APP_FLAG_Int(Name)
+#define ZEP_APP_FLAG_UInt(Name)
+#define ZEP_APP_FLAG_Double(Name)
+#define ZEP_APP_FLAG_Text(Name)
+#define ZEP_APP_FLAG_TextList(Name)
+#define ZEP_APP_FLAG_FlagArray(Name) #Name,
+#define ZEP_APP_FLAG_IntArray(Name)
+#define ZEP_APP_FLAG_DoubleArray(Name)
+#define ZEP_APP_FLAG_ColorInt(Name)
+#define ZEP_APP_FLAG_ColorUInt(Name)
+const std::set<std::string> kGridFlags = {
+#include "ZEP2DBaseOptGridFrm.def"
+};
+const std::set<std::string> kGeneralFlags = {
+#include "ZEP2DBaseOptGalFrm.def"
+};
+const std::set<std::string> kPrimaryViewFlags = {
+#include "ZEP2DBasePrimaryViewFrm.def"
+};
+const std::set<std::string> kDimensionFlags = {
+#include "ZEP2DBaseOptDimFrm.def"
+};
+const std::set<std::string> kGeometryFlags = {
+#include "ZEP2DBaseOptGeoFrm.def"
+};
+#undef ZEP_SETTING
 } // namespace
 
 const std::vector<ZEPAppPage>& AppPages() {
   static const std::vector<ZEPAppPage> pages = {
-      {"general", "General", "General", &Open<GeneralPage>, kGeneralStored, {}, {}},
-      {"dimension", "Dimension", "Dimension", &Open<DimensionPage>, kDimensionStored, {"pushAssoc3D"}, {}},
-      {"grid", "Grid", "Grid", &Open<GridPage>, kGridStored, {}, {}},
-      {"geometry",
-       "Geometry",
-       "Geometry",
-       &Open<GeometryPage>,
-       kGeometryStored,
-       {"dragOptionPushButton", "smartPickPushButton", "cstTypesPushButton"},
-       {"Grid"}},
-      {"primary-view",
-       "Primary view",
-       "PrimaryView",
-       &Open<PrimaryViewPage>,
-       kPrimaryViewStored,
-       {},
-       {}},
+      // clang-format off
+      {"general", "General", "General", &Open<GeneralPage>, kGeneralStored, {}, {}, kGeneralFlags},
+      {"dimension", "Dimension", "Dimension", &Open<DimensionPage>, kDimensionStored, {"pushAssoc3D"}, {},
+       kDimensionFlags},
+      {"grid", "Grid", "Grid", &Open<GridPage>, kGridStored, {}, {}, kGridFlags},
+      {"geometry", "Geometry", "Geometry", &Open<GeometryPage>, kGeometryStored,
+       {"dragOptionPushButton", "smartPickPushButton", "cstTypesPushButton"}, {"Grid"}, kGeometryFlags},
+      {"primary-view", "Primary view", "PrimaryView", &Open<PrimaryViewPage>, kPrimaryViewStored, {}, {},
+       kPrimaryViewFlags},
+      // clang-format on
   };
   return pages;
 }

@@ -5,6 +5,7 @@
 
 #include <functional>
 #include <map>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -22,6 +23,8 @@ struct ZEPAppPage {
   std::vector<std::string> dialogButtons;
   // Pages embedded in this one, by table name: their controls keep their own settings.
   std::vector<std::string> embedded;
+  // The attributes a check button shows: stored as 0 or 1.
+  std::set<std::string> flags;
 
   // Whether a row of ZEPAppSettings.def belongs to a control shown on this page.
   bool Shows(const ZEPAppSetting& iSetting) const;

@@ -14,35 +14,6 @@ namespace zepapp {
 
 namespace {
 
-// Flags of the pages' tables: a check button stores 0 or 1.
-struct PageAttribute {
-  const char* page;
-  const char* attribute;
-  bool flag;
-};
-#define ZEP_SETTING(Name, Kind) {kPage, #Name, std::is_same_v<ZEP_TYPE_##Kind, unsigned char>},
-constexpr const char* kGrid = "Grid";
-constexpr const char* kGeneral = "General";
-constexpr const char* kPrimaryView = "PrimaryView";
-const PageAttribute kPageAttributes[] = {
-#define kPage kGrid
-#include "ZEP2DBaseOptGridFrm.def"
-#undef kPage
-#define kPage kGeneral
-#include "ZEP2DBaseOptGalFrm.def"
-#undef kPage
-#define kPage kPrimaryView
-#include "ZEP2DBasePrimaryViewFrm.def"
-#undef kPage
-};
-#undef ZEP_SETTING
-
-bool IsFlag(const ZEPAppSetting& iSetting) {
-  for (const PageAttribute& a : kPageAttributes)
-    if (iSetting.page == a.page && iSetting.attribute == a.attribute) return a.flag;
-  return false;
-}
-
 // The limits of the controls, by stored attribute. Lengths are millimetres at the normal scale;
 // a per-range length scales with its range as its spinner does.
 struct Limits {
@@ -61,6 +32,12 @@ const std::map<std::string, Limits>& KnownLimits() {
       {"Drw_settings_GridVSecondaryStep", {1.0, 100000.0, false, false}},
       // The general page's unit lines: millimetre, centimetre, inch.
       {"DrwPaperLengthUnit", {1.0, 5.0, false, false, {1.0, 3.0, 5.0}}},
+      {"DrwGeoCstRefSize", {0.0, 100000.0, false, false}},
+      {"DrwDimConstantOffsetValue", {-1000.0, 1000.0, false, false}},
+      {"DrwDimOffsetRefMM", {-1000.0, 1000.0, false, false}},
+      {"DrwDimOffsetBetMM", {-1000.0, 1000.0, false, false}},
+      {"DrwDimOffsetRefDeg", {-180.0, 180.0, false, false}},
+      {"DrwDimOffsetBetDeg", {-180.0, 180.0, false, false}},
   };
   return limits;
 }
@@ -137,7 +114,7 @@ std::vector<ZEPAppAttrRule> AppSettingRules() {
         else if (kind->second == ZEPAppStored::Int) rule.type = 1;
         else if (kind->second == ZEPAppStored::UInt) rule.type = 2;
       }
-    const bool flag = IsFlag(s);
+    const bool flag = page && page->flags.count(s.attribute) != 0;
     auto known = KnownLimits().find(s.stored);
     if (flag || known != KnownLimits().end()) {
       const Limits limits = known != KnownLimits().end() ? known->second : Limits{0, 1, false, false};
