@@ -7,6 +7,7 @@
 #include <algorithm>
 #include <cctype>
 #include <cmath>
+#include <cstdio>
 #include <cstdlib>
 
 namespace zepapp {
@@ -81,6 +82,25 @@ bool TakesWholeNumbers(const ZEPDlgSpinner& s) {
   double lo = 0, hi = 0, step = 1;
   s.GetMinMaxStep(lo, hi, step);
   return !s.HasLimits() || (IsWhole(lo) && IsWhole(hi) && IsWhole(step));
+}
+
+// The spinner's value in its display unit, in the fewest digits that read back to the very same
+// value: typing what is shown never changes a setting.
+std::string ExactValue(const ZEPDlgSpinner& iSpinner) {
+  const double internal = iSpinner.GetValue();
+  const double shown = iSpinner.ToDisplay(internal);
+  // Plain decimals for the sizes people type, the exponent form beyond them.
+  const bool plain = shown == 0 || (std::fabs(shown) >= 1e-5 && std::fabs(shown) < 1e15);
+  std::string text;
+  for (int digits = plain ? 0 : 1; digits <= (plain ? 20 : 17); ++digits) {
+    char buffer[64];
+    std::snprintf(buffer, sizeof buffer, plain ? "%.*f" : "%.*g", digits, shown);
+    text = buffer;
+    if (iSpinner.FromDisplay(std::strtod(buffer, nullptr)) == internal) break;
+  }
+  if (text == "-0") text = "0";
+  const std::string symbol = iSpinner.UnitSymbol();
+  return symbol.empty() ? text : text + " " + symbol;
 }
 
 // Length of the number at the start of s ("-2.5e3"); 0 when it does not start with one.
@@ -204,10 +224,8 @@ std::string ZEPAppControl::Shown() const {
   switch (Kind()) {
   case ZEPAppKind::Check:
     return ZEPSysDynamicCast<ZEPDlgCheckButton>(inner)->GetState() == ZEPDlgChecked ? "on" : "off";
-  case ZEPAppKind::Spinner: {
-    const auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(inner);
-    return spinner->FormatValue(spinner->GetValue());
-  }
+  case ZEPAppKind::Spinner:
+    return ExactValue(*ZEPSysDynamicCast<ZEPDlgSpinner>(inner));
   case ZEPAppKind::Combo: {
     const ZEPDlgCombo* combo = PickableCombo(inner);
     ZEPUnicodeString text;
@@ -498,6 +516,7 @@ ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls,
       if (value < lo - slack || value > hi + slack)
         return BadValue(iControl, spinner->FormatValue(value) + " is outside the limits");
     }
+    if (value == spinner->GetValue()) return Done(iControl, false); // what it shows already
     if (!ZEPDlgDriver::Enter(iControl.inner, value)) return Refused(iControl);
     return Done(iControl, true);
   }

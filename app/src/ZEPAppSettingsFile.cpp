@@ -543,6 +543,19 @@ long ZEPAppSettingsFile::SetAdminDefault(const std::string& iRepository, const s
   });
 }
 
+long ZEPAppSettingsFile::RemoveAdminDefault(const std::string& iRepository, const std::string& iAttribute,
+                                            ZEPAppRepoKind iKind) {
+  Impl& d = *_pImpl;
+  return d.EditAdmin(iKind, iRepository, iAttribute, [&](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) -> long {
+    if (e.locked) return d.Fail(iAttribute + " is locked: unlock it first (its value then stays as a default)");
+    if (!e.value) return 1;
+    e.value.reset();
+    return S_OK;
+  });
+}
+
+const ZEPAppSettingsDoc& ZEPAppSettingsFile::AdminDoc() const { return _pImpl->admin.doc; }
+
 long ZEPAppSettingsFile::Reset(const std::string& iRepository, const std::string& iAttribute, ZEPAppRepoKind iKind) {
   Impl& d = *_pImpl;
   d.lastError.clear();

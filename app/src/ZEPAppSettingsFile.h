@@ -102,6 +102,12 @@ public:
               ZEPAppRepoKind iKind = ZEPAppRepoKind::Setting);
   long SetAdminDefault(const std::string& iRepository, const std::string& iAttribute, const ZEPAppValue& iValue,
                        ZEPAppRepoKind iKind = ZEPAppRepoKind::Setting);
+  // Drops the administrator's default of an attribute that is not locked. 1 when it had none
+  // (nothing written); E_FAIL for a locked one (its value is the lock's: unlock it first).
+  long RemoveAdminDefault(const std::string& iRepository, const std::string& iAttribute,
+                          ZEPAppRepoKind iKind = ZEPAppRepoKind::Setting);
+  // The administrator's file as last read or written.
+  const ZEPAppSettingsDoc& AdminDoc() const;
 
   // User's file: drops the user's value so that the default shows again, and saves. A locked
   // attribute is refused; ResetAll leaves locked attributes as they are.
