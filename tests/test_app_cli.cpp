@@ -351,6 +351,7 @@ TEST_F(AppCli, FaultyFileIsReportedAndNeverWritten) {
 }
 
 TEST_F(AppCli, RenderIsOneSelfContainedDialog) {
+  setenv("ZEP_TDE_LA", "1", 1); // every section of every page is drawn
   ASSERT_EQ(Run({"lock", "Drw_settings_GridDisplay"}).code, kExitOk);
   const fs::path file = _dir / "pages.html";
   Result r = Run({"render", "--html", file.string()});
