@@ -1,8 +1,10 @@
 // Page costs: building and initialising each page, and one user change reaching its hook.
 #include "ZEP2DBaseOptDimFrm.h"
+#include "ZEP2DBaseOptAdminFrm.h"
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
+#include "ZEP2DBaseOptManipFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
 #include <benchmark/benchmark.h>
@@ -43,6 +45,23 @@ struct GeoPage : ZEP2DBaseOptGeoFrm {
   long _writes = 0;
   ZEP2DBaseOptGridFrm* CreateGridFrame() override { return new GridPage(this); }
 #include "ZEP2DBaseOptGeoFrm.def"
+};
+struct ManipPage : ZEP2DBaseOptManipFrm {
+  explicit ManipPage(ZEPDialog* iParent) : ZEP2DBaseOptManipFrm(iParent, "ManipulatorsPage") {}
+  void Build() { ZEP2DBaseOptManipFrm::Build(1); }
+  long _writes = 0;
+#include "ZEP2DBaseOptManipFrm.def"
+};
+struct AdminPage : ZEP2DBaseOptAdminFrm {
+  explicit AdminPage(ZEPDialog* iParent) : ZEP2DBaseOptAdminFrm(iParent, "AdministrationPage") {}
+  void Build() { ZEP2DBaseOptAdminFrm::Build(0); }
+  long _writes = 0;
+  ZEPString GetFrameIconName() override { return "I_AdminDrawing"; }
+  unsigned char WithFrmGVS() override { return 1; }
+  unsigned char WithFrmAssemblyMgmt() override { return 1; }
+  unsigned char WithFrmTitleBlock() override { return 1; }
+  ZEPSysPreferenceRepository* GetDlgPreferenceRepository() override { return nullptr; }
+#include "ZEP2DBaseOptAdminFrm.def"
 };
 #undef ZEP_SETTING
 
@@ -102,3 +121,30 @@ void PrimaryViewClickResize(benchmark::State& state) { ClickToHook<PrimaryViewPa
 BENCHMARK(GridClickSnap);
 BENCHMARK(GalClickViewFrame);
 BENCHMARK(PrimaryViewClickResize);
+
+BENCHMARK_TEMPLATE(BuildAndInitialize, ManipPage);
+BENCHMARK_TEMPLATE(BuildAndInitialize, AdminPage);
+
+// Every page of this module built and initialised, one after the other, as the options dialog
+// opens them.
+template <class Page> ZEPDlgFrame* Opened(ZEPDialog* iParent) {
+  auto* page = new Page(iParent);
+  page->Build();
+  page->Initialize();
+  return page;
+}
+void AllPagesBuildAndInitialize(benchmark::State& state) {
+  ZEPDlgWindow root(nullptr, "root", 0);
+  for (auto _ : state) {
+    ZEPDlgFrame* pages[] = {Opened<GridPage>(&root),  Opened<GalPage>(&root),
+                            Opened<PrimaryViewPage>(&root), Opened<GeoPage>(&root),
+                            Opened<ManipPage>(&root), Opened<AdminPage>(&root)};
+    benchmark::DoNotOptimize(pages);
+    for (ZEPDlgFrame* page : pages)
+      delete page;
+  }
+}
+BENCHMARK(AllPagesBuildAndInitialize);
+
+void ManipClickMatrixCell(benchmark::State& state) { ClickToHook<ManipPage>(state, "_checkDimChangeSymbolMod"); }
+BENCHMARK(ManipClickMatrixCell);

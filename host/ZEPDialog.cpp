@@ -450,7 +450,7 @@ const UnitInfo kUnits[] = {
     {46, "cm", 100.0},       {47, "km", 0.001},        {48, "in", 1.0 / 0.0254},
     {49, "ft", 1.0 / 0.3048}, {50, "in", 1.0 / 0.0254}, {51, "in", 1.0 / 0.0254},
     {52, "in", 1.0 / 0.0254}, {11, "rad", 1.0},         {12, "deg", 57.29577951308232},
-    {15, "gr", 63.66197723675813}};
+    {15, "gr", 63.66197723675813}, {25, "%", 100.0}};
 const UnitInfo* FindUnit(ZEPDlgUnit iUnit) {
   for (const UnitInfo& u : kUnits)
     if (u.unit == iUnit) return &u;

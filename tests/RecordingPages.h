@@ -4,9 +4,11 @@
 #include "PageRecorder.h"
 
 #include "ZEP2DBaseOptDimFrm.h"
+#include "ZEP2DBaseOptAdminFrm.h"
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
+#include "ZEP2DBaseOptManipFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
 class RecordingGridPage : public Recording<ZEP2DBaseOptGridFrm> {
@@ -56,6 +58,57 @@ protected:
 #undef ZEP_SETTING
   ZEP2DBaseOptGridFrm* CreateGridFrame() override {
     return _script.Option("CreateGridFrame", 1) ? new RecordingGridPage(_script, this) : nullptr;
+  }
+};
+
+// The manipulators page: its layout option from the script's "WithDimManipSection"; Build's
+// flag from "BuildFlag" (1 unless scripted).
+class RecordingManipPage : public Recording<ZEP2DBaseOptManipFrm> {
+public:
+  RecordingManipPage(HookScript& iScript, ZEPDialog* iParent)
+      : Recording<ZEP2DBaseOptManipFrm>(iScript, iParent, "ManipulatorsPage") {}
+  void Build() { ZEP2DBaseOptManipFrm::Build(static_cast<unsigned char>(_script.Option("BuildFlag", 1))); }
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptManipFrm, Name, Kind)
+#include "ZEP2DBaseOptManipFrm.def"
+#undef ZEP_SETTING
+  unsigned char WithDimManipSection() override {
+    return static_cast<unsigned char>(
+        _script.Option("WithDimManipSection", ZEP2DBaseOptManipFrm::WithDimManipSection()));
+  }
+};
+
+// The administration page: its host operations from the script ("WithFrmGVS",
+// "WithFrmAssemblyMgmt", "WithFrmTitleBlock", all 1 unless scripted; "BuildFlag", 0 unless
+// scripted); every call to WithFrmGVS is counted in the script's reads. The behaviour dialog's
+// place is saved in the preference repository named by the "SaveTo" text ("DraftingOptions"
+// unless scripted; an empty text: none).
+class RecordingAdminPage : public Recording<ZEP2DBaseOptAdminFrm> {
+public:
+  RecordingAdminPage(HookScript& iScript, ZEPDialog* iParent)
+      : Recording<ZEP2DBaseOptAdminFrm>(iScript, iParent, "AdministrationPage") {}
+  void Build() { ZEP2DBaseOptAdminFrm::Build(static_cast<unsigned char>(_script.Option("BuildFlag", 0))); }
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptAdminFrm, Name, Kind)
+#include "ZEP2DBaseOptAdminFrm.def"
+#undef ZEP_SETTING
+  ZEPString GetFrameIconName() override { return "I_AdminDrawing"; }
+  unsigned char WithFrmGVS() override {
+    _script.reads.push_back("WithFrmGVS");
+    return static_cast<unsigned char>(_script.Option("WithFrmGVS", 1));
+  }
+  unsigned char WithFrmAssemblyMgmt() override {
+    return static_cast<unsigned char>(_script.Option("WithFrmAssemblyMgmt", 1));
+  }
+  unsigned char WithFrmTitleBlock() override {
+    return static_cast<unsigned char>(_script.Option("WithFrmTitleBlock", 1));
+  }
+  ZEPSysPreferenceRepository* GetDlgPreferenceRepository() override {
+    auto it = _script.texts.find("SaveTo");
+    const std::string name = it == _script.texts.end() ? "DraftingOptions" : it->second;
+    return name.empty() ? nullptr : ZEPSysPreferenceRepository::GetPreferenceRepository(name.c_str());
   }
 };
 

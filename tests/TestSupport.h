@@ -40,6 +40,9 @@ protected:
     ZEPCkeUnitsSetup::Reset();
     ZEPScalesSetup::Reset();
     ZEPStdSetup::Reset();
+    ZEPMessageBoxSetup::Reset();
+    // The administration page shows a section when this is set: not from the shell.
+    unsetenv("ZEP_TDE_LA");
   }
   // A top-level window that owns what a test builds on it.
   ZEPDlgWindow _root{nullptr, "root", 0};

@@ -351,6 +351,7 @@ TEST_F(AppCli, FaultyFileIsReportedAndNeverWritten) {
 }
 
 TEST_F(AppCli, RenderIsOneSelfContainedDialog) {
+  setenv("ZEP_TDE_LA", "1", 1); // every section of every page is drawn
   ASSERT_EQ(Run({"lock", "Drw_settings_GridDisplay"}).code, kExitOk);
   const fs::path file = _dir / "pages.html";
   Result r = Run({"render", "--html", file.string()});
@@ -506,4 +507,68 @@ TEST_F(AppCli, DimensionPageWithItsAssociativityDialog) {
   ASSERT_EQ(Run({"set", "dimension", "checkDimSketch", "off"}).code, kExitOk);
   EXPECT_EQ(Run({"set", "dimension", "editorDimLinePosValue", "5mm"}).code, kExitOk);
   EXPECT_EQ(Stored("DraftingOptions", "DrwDimConstantOffsetValue"), std::vector<double>{5});
+}
+
+// ---- manipulators and administration pages --------------------------------------------------
+TEST_F(AppCli, ManipulatorMatrixCellsAndTransparency) {
+  Result show = Run({"show", "manipulators"});
+  ASSERT_EQ(show.code, kExitOk) << show.err;
+  EXPECT_NE(show.out.find("Change symbol / Modification"), std::string::npos) << show.out;
+  EXPECT_NE(show.out.find("Move datum / Edition"), std::string::npos);
+  ASSERT_EQ(Run({"set", "manipulators", "_checkDimChangeSymbolMod", "off"}).code, kExitOk);
+  EXPECT_EQ(Stored("DraftingOptions", "DrwManipDimChangeSymbolMod"), std::vector<double>{0});
+  EXPECT_EQ(Run({"get", "manipulators", "_checkDimChangeSymbolCre"}).out, "on\n");
+  // A percentage is kept as the user typed it.
+  ASSERT_EQ(Run({"set", "manipulators", "editorManipTransparency", "29"}).code, kExitOk);
+  EXPECT_EQ(Stored("DraftingOptions", "DrwManipTransparency"), std::vector<double>{29});
+  EXPECT_EQ(Run({"get", "manipulators", "editorManipTransparency"}).out, "29 %\n");
+  EXPECT_EQ(Run({"set", "manipulators", "editorManipTransparency", "150"}).code, kExitBadValue);
+}
+
+TEST_F(AppCli, AdministrationRulesAreExplained) {
+  ASSERT_EQ(Run({"set", "administration", "frmSelectionOnCurrentAssembly", "1"}).code, kExitOk);
+  EXPECT_EQ(Stored("DraftingOptions", "DrwSelectionOnCurrentAssembly"), std::vector<double>{0});
+  Result scope = Run({"set", "administration", "chkShowWarningSelectionOutAssembly", "off"});
+  EXPECT_EQ(scope.code, kExitRefused);
+  EXPECT_NE(scope.err.find("is disabled while \"Selection scope\" is \"Elements under the "
+                           "current assembly root\"; choose"),
+            std::string::npos)
+      << scope.err;
+  ASSERT_EQ(Run({"set", "administration", "frmSelectionOnCurrentAssembly", "3"}).code, kExitOk);
+  ASSERT_EQ(Run({"set", "administration", "chkShowWarningSelectionOutAssembly", "on"}).code,
+            kExitOk);
+  Result favourite =
+      Run({"set", "administration", "chkShowWarningSelectionOutFavoriteContext", "off"});
+  EXPECT_EQ(favourite.code, kExitRefused);
+  EXPECT_NE(favourite.err.find("while \"Outside the current assembly\" is on"), std::string::npos)
+      << favourite.err;
+  // Distinguishing needs one unique-name check; the view name scope needs the view names one.
+  for (const char* name : {"checkSheetNamesUnicity", "checkViewNamesUnicity"})
+    ASSERT_EQ(Run({"set", "administration", name, "off"}).code, kExitOk);
+  Result distinguish = Run({"set", "administration", "chkDistinguishCodeInUnicity", "on"});
+  EXPECT_EQ(distinguish.code, kExitRefused);
+  EXPECT_NE(distinguish.err.find("while all of these are off; turn \"Sheet names must be unique\""),
+            std::string::npos)
+      << distinguish.err;
+  Result viewScope = Run({"set", "administration", "frmViewNameUnicityScope", "2"});
+  EXPECT_EQ(viewScope.code, kExitRefused);
+  EXPECT_NE(viewScope.err.find("turn \"View names must be unique\" (checkViewNamesUnicity) on"),
+            std::string::npos)
+      << viewScope.err;
+  ASSERT_EQ(Run({"set", "administration", "chkCaptureNamesUnicity", "on"}).code, kExitOk);
+  EXPECT_EQ(Run({"set", "administration", "chkDistinguishCodeInUnicity", "on"}).code, kExitOk);
+}
+
+TEST_F(AppCli, BehaviorDialogRowsAreSetThroughTheirLines) {
+  Result show = Run({"show", "administration"});
+  ASSERT_EQ(show.code, kExitOk) << show.err;
+  for (const char* row : {"cmbDrwTbFontName", "cmbDrwTbPattern"})
+    EXPECT_NE(show.out.find(row), std::string::npos) << row;
+  ASSERT_EQ(Run({"set", "administration", "cmbDrwTbFrame", "no override"}).code, kExitOk);
+  EXPECT_EQ(Stored("DraftingOptions", "DrwTbFrame"), std::vector<double>{3});
+  ASSERT_EQ(Run({"set", "administration", "cmbDrwTbPattern", "fixed"}).code, kExitOk);
+  EXPECT_EQ(Stored("DraftingOptions", "DrwTbPattern"), std::vector<double>{0});
+  EXPECT_EQ(Run({"get", "administration", "cmbDrwTbPattern"}).out, "Fixed\n");
+  // The dialog's place is among the user's preferences.
+  EXPECT_NE(ReadBytes(_settings).find("dlgPropTbBehaviorHeight"), std::string::npos);
 }

@@ -32,6 +32,12 @@ const std::vector<std::string> kGeoAttributes = {
 #include "ZEP2DBaseOptGeoFrm.def"
 #include "ZEP2DBaseOptGridFrm.def"
 };
+const std::vector<std::string> kManipAttributes = {
+#include "ZEP2DBaseOptManipFrm.def"
+};
+const std::vector<std::string> kAdminAttributes = {
+#include "ZEP2DBaseOptAdminFrm.def"
+};
 #undef ZEP_SETTING
 
 std::vector<PageCase> Pages() {
@@ -43,7 +49,13 @@ std::vector<PageCase> Pages() {
            [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingPrimaryViewPage>(s, p); },
            kPrimaryViewAttributes, 0},
           {"Geometry", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingGeoPage>(s, p); },
-           kGeoAttributes, 4}};
+           kGeoAttributes, 4},
+          {"Manipulators",
+           [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingManipPage>(s, p); },
+           kManipAttributes, 0},
+          {"Administration",
+           [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingAdminPage>(s, p); },
+           kAdminAttributes, 2}};
 }
 
 void Collect(ZEPDialog* iWidget, std::vector<ZEPDialog*>& oAll) {

@@ -65,6 +65,7 @@ public:
     const long rc = _file.Load(_paths.user, _paths.admin);
     for (const std::string& name : AppRepositories())
       _file.OpenSettings(name);
+    _file.OpenPreferences("DraftingOptions"); // where dialogs keep their places
     ApplyDefaults();
     _pRoot = std::make_unique<ZEPDlgWindow>(nullptr, "DraftingOptions", 0);
     for (const ZEPAppFileError& w : _file.LoadWarnings())

@@ -156,6 +156,36 @@ const Dependency kDependencies[] = {
     {"cstTypesPushButton", "checkCstVisu", true, false},
     {"editorDimLinePosValue", "checkDimSketch", false, false},
     {"checkLineUpAutoFunnel", "checkLineUpCumulVal", true, false},
+    {"chkGVSParamOverride", "chkPreventGVS", false, false},
+    {"chkPrevViewGeomUpgrade", "chkPreventViewUpgrade", false, false},
+    {"frmViewNameUnicityScope", "checkViewNamesUnicity", true, false},
+    {"chkShowWarningSelectionOutFavoriteContext", "chkShowWarningSelectionOutAssembly", false,
+     false},
+};
+
+// Controls that need at least one of several check buttons on.
+struct AnyOf {
+  const char* control;
+  std::vector<const char*> needs;
+};
+const AnyOf kAnyOf[] = {
+    {"chkDistinguishCodeInUnicity",
+     {"checkSheetNamesUnicity", "checkViewNamesUnicity", "checkFilterNamesUnicity",
+      "chkCaptureNamesUnicity"}},
+    {"chkDistinguishCaseInUnicity",
+     {"checkSheetNamesUnicity", "checkViewNamesUnicity", "checkFilterNamesUnicity",
+      "chkCaptureNamesUnicity"}},
+};
+
+// Controls enabled only while a choice (radio group) shows one of some choices, by position.
+struct ChoiceRule {
+  const char* control;
+  const char* choice;
+  std::vector<int> allowed;
+};
+const ChoiceRule kChoiceRules[] = {
+    {"chkShowWarningSelectionOutAssembly", "frmSelectionOnCurrentAssembly", {1, 2}},
+    {"chkShowWarningSelectionOutFavoriteContext", "frmSelectionOnCurrentAssembly", {2}},
 };
 
 // The radio buttons of a group frame, in screen order.
@@ -165,6 +195,22 @@ std::vector<ZEPDlgRadioButton*> Radios(ZEPDialog* iGroup) {
     for (ZEPDialog* child : iGroup->GetChildren())
       if (auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(child)) radios.push_back(radio);
   return radios;
+}
+
+// A check button of a matrix has no text of its own: its row's text label (column 1 of its
+// row) and its column's header (row 0 of its column) name it.
+std::string MatrixTitle(const ZEPDialog& iCell) {
+  const ZEPDialog* grid = iCell.GetParentDialog();
+  if (!grid) return "";
+  const ZEPDialog::Cell& at = iCell.GetGridConstraints();
+  std::string row, column;
+  for (const ZEPDialog* w : grid->GetChildren()) {
+    if (std::string(w->KindName()) != "label" || w->GetTitle().IsEmpty()) continue;
+    const ZEPDialog::Cell& c = w->GetGridConstraints();
+    if (at.row > 0 && c.row == at.row && c.column == 1) row = w->GetTitle().str();
+    if (c.row == 0 && c.column == at.column) column = w->GetTitle().str();
+  }
+  return row.empty() || column.empty() ? "" : row + " / " + column;
 }
 
 std::string TitleOf(const ZEPDialog& w) {
@@ -217,7 +263,8 @@ ZEPAppKind ZEPAppControl::Kind() const {
 std::string ZEPAppControl::Title() const {
   if (!inner->GetTitle().IsEmpty()) return inner->GetTitle().str();
   if (!widget->GetTitle().IsEmpty()) return widget->GetTitle().str();
-  return name;
+  const std::string matrix = MatrixTitle(*widget);
+  return matrix.empty() ? name : matrix;
 }
 
 std::string ZEPAppControl::Shown() const {
@@ -355,7 +402,13 @@ int ShownRange(const std::vector<ZEPAppControl>& iControls) {
 std::string WhyRefused(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl) {
   const std::string title = Quoted(iControl.Title());
   if (iControl.Locked()) return title + " is locked: " + iControl.LockText();
-  const std::string why = ZEPDlgDriver::WhyNotOperable(iControl.inner);
+  std::string why = ZEPDlgDriver::WhyNotOperable(iControl.inner);
+  // A choice is operated through its radios: it is disabled when they all are.
+  const std::vector<ZEPDlgRadioButton*> radios = Radios(iControl.inner);
+  if (why.empty() && !radios.empty() &&
+      std::none_of(radios.begin(), radios.end(),
+                   [](ZEPDlgRadioButton* r) { return r->IsEffectivelyEnabled(); }))
+    why = ZEPDlgDriver::WhyNotOperable(radios.front());
   if (why.empty()) return "";
   if (why.rfind("locked", 0) == 0) return title + " is " + why; // a lock further up the tree
   if (why == "hidden") return title + " is hidden on this page";
@@ -372,6 +425,37 @@ std::string WhyRefused(const std::vector<ZEPAppControl>& iControls, const ZEPApp
     }
     return text + "; turn " + Quoted(needed->Title()) + " (" + needed->name + ") " +
            (d.whileOn ? "on" : "off") + " first";
+  }
+  for (const AnyOf& rule : kAnyOf) {
+    if (rule.control != iControl.name) continue;
+    std::vector<const ZEPAppControl*> needed;
+    for (const char* name : rule.needs)
+      if (const ZEPAppControl* c = ByName(iControls, name)) needed.push_back(c);
+    if (needed.empty() ||
+        std::any_of(needed.begin(), needed.end(),
+                    [](const ZEPAppControl* c) { return c->Shown() == "on"; }))
+      continue;
+    std::string names;
+    for (std::size_t i = 0; i < needed.size(); ++i)
+      names += (i == 0 ? "" : i + 1 == needed.size() ? " or " : ", ") + Quoted(needed[i]->Title()) +
+               " (" + needed[i]->name + ")";
+    return title + " is disabled while all of these are off; turn " + names + " on first";
+  }
+  for (const ChoiceRule& rule : kChoiceRules) {
+    const ZEPAppControl* choice =
+        rule.control == iControl.name ? ByName(iControls, rule.choice) : nullptr;
+    if (!choice) continue;
+    const std::vector<std::string> texts = Choices(*choice);
+    const std::string shown = choice->Shown();
+    const auto at = std::find(texts.begin(), texts.end(), shown);
+    const int index = at == texts.end() ? -1 : static_cast<int>(at - texts.begin());
+    if (std::find(rule.allowed.begin(), rule.allowed.end(), index) != rule.allowed.end()) continue;
+    std::string wanted;
+    for (std::size_t i = 0; i < rule.allowed.size(); ++i)
+      if (rule.allowed[i] < static_cast<int>(texts.size()))
+        wanted += (i == 0 ? "" : " or ") + Quoted(texts[static_cast<std::size_t>(rule.allowed[i])]);
+    return title + " is disabled while " + Quoted(choice->Title()) + " is " + Quoted(shown) +
+           "; choose " + wanted + " (" + choice->name + ") first";
   }
   return title + " is disabled on this page";
 }

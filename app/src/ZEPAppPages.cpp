@@ -1,9 +1,11 @@
 #include "ZEPAppPages.h"
 
 #include "ZEP2DBaseOptDimFrm.h"
+#include "ZEP2DBaseOptAdminFrm.h"
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
+#include "ZEP2DBaseOptManipFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
 #include <algorithm>
@@ -83,6 +85,44 @@ private:
   ZEPAppBinding _binding{"Dimension"};
 };
 
+// Every manipulator of dimensions and annotations is shown.
+class ManipulatorsPage : public ZEP2DBaseOptManipFrm {
+public:
+  explicit ManipulatorsPage(ZEPDialog* iParent) : ZEP2DBaseOptManipFrm(iParent, "ManipulatorsPage") {}
+  void Build() { ZEP2DBaseOptManipFrm::Build(1); }
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)
+#include "ZEP2DBaseOptManipFrm.def"
+#undef ZEP_SETTING
+
+private:
+  ZEPAppBinding _binding{"Manipulators"};
+};
+
+// The administrator's page with every frame; the behaviour dialog keeps its place in the
+// user's preferences, in the repository it is read from.
+class AdministrationPage : public ZEP2DBaseOptAdminFrm {
+public:
+  explicit AdministrationPage(ZEPDialog* iParent) : ZEP2DBaseOptAdminFrm(iParent, "AdministrationPage") {}
+  void Build() { ZEP2DBaseOptAdminFrm::Build(0); }
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)
+#include "ZEP2DBaseOptAdminFrm.def"
+#undef ZEP_SETTING
+  ZEPString GetFrameIconName() override { return "I_AdminDrawing"; }
+  unsigned char WithFrmGVS() override { return 1; }
+  unsigned char WithFrmAssemblyMgmt() override { return 1; }
+  unsigned char WithFrmTitleBlock() override { return 1; }
+  ZEPSysPreferenceRepository* GetDlgPreferenceRepository() override {
+    return ZEPSysPreferenceRepository::GetPreferenceRepository("DraftingOptions");
+  }
+
+private:
+  ZEPAppBinding _binding{"Administration"};
+};
+
 template <class Page> ZEPDlgFrame* Open(ZEPDialog* iParent) {
   auto* page = new Page(iParent);
   page->Build();
@@ -105,6 +145,12 @@ const std::map<std::string, ZEPAppStored> kDimensionStored = {
 };
 const std::map<std::string, ZEPAppStored> kGeometryStored = {
 #include "ZEP2DBaseOptGeoFrm.def"
+};
+const std::map<std::string, ZEPAppStored> kManipulatorsStored = {
+#include "ZEP2DBaseOptManipFrm.def"
+};
+const std::map<std::string, ZEPAppStored> kAdministrationStored = {
+#include "ZEP2DBaseOptAdminFrm.def"
 };
 #undef ZEP_SETTING
 
@@ -135,7 +181,20 @@ const std::set<std::string> kDimensionFlags = {
 const std::set<std::string> kGeometryFlags = {
 #include "ZEP2DBaseOptGeoFrm.def"
 };
+const std::set<std::string> kManipulatorsFlags = {
+#include "ZEP2DBaseOptManipFrm.def"
+};
+const std::set<std::string> kAdministrationFlags = {
+#include "ZEP2DBaseOptAdminFrm.def"
+};
 #undef ZEP_SETTING
+
+// Settings whose control a page builds only when an environment variable is set.
+const struct {
+  const char* page;
+  const char* attribute;
+  const char* variable;
+} kEnvironmentGated[] = {{"Administration", "PrevTrueDim", "ZEP_TDE_LA"}};
 } // namespace
 
 const std::vector<ZEPAppPage>& AppPages() {
@@ -149,12 +208,20 @@ const std::vector<ZEPAppPage>& AppPages() {
        {"dragOptionPushButton", "smartPickPushButton", "cstTypesPushButton"}, {"Grid"}, kGeometryFlags},
       {"primary-view", "Primary view", "PrimaryView", &Open<PrimaryViewPage>, kPrimaryViewStored, {}, {},
        kPrimaryViewFlags},
+      {"manipulators", "Manipulators", "Manipulators", &Open<ManipulatorsPage>, kManipulatorsStored, {}, {},
+       kManipulatorsFlags},
+      {"administration", "Administration", "Administration", &Open<AdministrationPage>, kAdministrationStored,
+       {"pushPropTbBehavior"}, {}, kAdministrationFlags},
       // clang-format on
   };
   return pages;
 }
 
 bool ZEPAppPage::Shows(const ZEPAppSetting& iSetting) const {
+  for (const auto& gated : kEnvironmentGated)
+    if (iSetting.page == gated.page && iSetting.attribute == gated.attribute &&
+        !ZEPGetEnv(gated.variable))
+      return false;
   return iSetting.page == table ||
          std::find(embedded.begin(), embedded.end(), iSetting.page) != embedded.end();
 }

@@ -1,0 +1,491 @@
+// Administration page and its property toolbar behaviour dialog: the host's operations, the
+// info gates, radio groups in lock frames, the sensitivity rules, the template creation
+// warning, the environment section and the dialog's rows, lines and placement.
+#include "RecordingPages.h"
+
+#include <algorithm>
+
+namespace {
+#define ZEP_SETTING(Name, Kind) #Name,
+const std::vector<std::string> kBehaviors = {
+#include "ZEP2DBaseOptAdminFrm.def"
+};
+#undef ZEP_SETTING
+
+class AdminPage : public ZEPHostTest {
+protected:
+  void Open() { _pPage = OpenPage<RecordingAdminPage>(_script, &_root); }
+  // A fresh page on a window of its own, for table tests.
+  RecordingAdminPage* Reopen() {
+    delete _pWindow;
+    _pWindow = new ZEPDlgWindow(&_root, "window", 0);
+    return _pPage = OpenPage<RecordingAdminPage>(_script, _pWindow);
+  }
+  ZEPDialog* Control(const std::string& iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
+  bool Checked(const std::string& iName) {
+    ZEPDialog* w = Control(iName);
+    if (auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(w))
+      return radio->GetState() == ZEPDlgChecked;
+    auto* check = ZEPSysDynamicCast<ZEPDlgCheckButton>(w);
+    return check && check->GetState() == ZEPDlgChecked;
+  }
+  bool Enabled(const std::string& iName) { return Control(iName)->IsEffectivelyEnabled(); }
+  std::vector<std::string> Hooks() {
+    std::vector<std::string> out;
+    for (const HookCall& c : _script.calls)
+      out.push_back(c.hook);
+    return out;
+  }
+  ZEPDlgDialog* PushBehavior() {
+    EXPECT_TRUE(ZEPDlgDriver::Click(Control("pushPropTbBehavior")));
+    return ZEPSysDynamicCast<ZEPDlgDialog>(ZEPDlgDriver::Find(_pPage, "dlgPropTbBehavior"));
+  }
+  ZEPDlgCombo* Combo(const std::string& iName) {
+    return ZEPSysDynamicCast<ZEPDlgCombo>(Control(iName));
+  }
+  std::vector<std::string> Lines(const std::string& iCombo) {
+    std::vector<std::string> out;
+    ZEPDlgCombo* combo = Combo(iCombo);
+    for (int i = 0; combo && i < combo->GetLineCount(); ++i) {
+      ZEPUnicodeString text;
+      combo->GetLine(text, i);
+      out.push_back(text.str());
+    }
+    return out;
+  }
+  int WithFrmGVSCalls() {
+    return static_cast<int>(std::count(_script.reads.begin(), _script.reads.end(), "WithFrmGVS"));
+  }
+  HookScript _script;
+  RecordingAdminPage* _pPage = nullptr;
+  ZEPDlgWindow* _pWindow = nullptr;
+};
+
+std::string Text(const char* iKey) {
+  return ZEPMsgCatalog::BuildMessage("ZEP2DBaseOptAdminFrm", iKey).str();
+}
+} // namespace
+
+TEST_F(AdminPage, ModuleHooksBuildOnlyWhatNeedsNoInfo) {
+  Open();
+  for (const char* absent :
+       {"checkSwitchStandard", "chkPreventViewUpgrade", "chkDisableTemplateCreation",
+        "checkSheetNamesUnicity", "frmViewNameUnicityScope", "chkDistinguishCaseInUnicity",
+        "frmEngineeringConnectionLocation", "radSelectedAssGeom", "toolDress"})
+    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, absent), nullptr) << absent;
+  for (const char* present : {"chkDisableAnnotLockEditionPropAccess", "chkPreventGVS", "chkReset",
+                              "FrameAndTitleBlockPath", "radAnyRelevantElement"})
+    EXPECT_NE(ZEPDlgDriver::Find(_pPage, present), nullptr) << present;
+  EXPECT_TRUE(ZEPDlgDriver::Find(_pPage, "toolsNamingUnicity")
+                  ->GetChildren()
+                  .front()
+                  ->GetChildren()
+                  .empty());
+  EXPECT_EQ(ZEPCheckLog::Count(), 0);
+  ExpectGolden("admin_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
+}
+
+TEST_F(AdminPage, BuildFlagAndHostOperationsDecideTheFrames) {
+  _script.allInfoSet = true;
+  const struct {
+    long flag, gvs, assembly, titleBlock;
+  } cases[] = {{0, 1, 1, 1}, {1, 1, 1, 1}, {0, 0, 0, 0}, {1, 0, 1, 0}};
+  for (const auto& c : cases) {
+    _script.options = {{"BuildFlag", c.flag},
+                       {"WithFrmGVS", c.gvs},
+                       {"WithFrmAssemblyMgmt", c.assembly},
+                       {"WithFrmTitleBlock", c.titleBlock}};
+    Reopen();
+    const std::string when = "flag " + std::to_string(c.flag);
+    for (const char* styles :
+         {"chkDisableTemplateCreation", "chkDisableGenMfgRequirements", "toolDrwStyle"})
+      EXPECT_EQ(ZEPDlgDriver::Find(_pPage, styles) != nullptr, c.flag == 0) << styles << when;
+    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "toolGVS") != nullptr, c.gvs != 0) << when;
+    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "toolAssemblyMgmt") != nullptr, c.assembly != 0) << when;
+    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "frameTitleBlock") != nullptr, c.titleBlock != 0) << when;
+    // The frames that exist fill rows 0, 1, 2, ... of the page.
+    short expected = 0;
+    for (ZEPDialog* frame : _pPage->GetChildren())
+      EXPECT_EQ(frame->GetGridConstraints().row, expected++) << frame->GetOwnName() << when;
+  }
+}
+
+TEST_F(AdminPage, InfoGatesNotNegativeOrExactlyZero) {
+  const struct {
+    const char* attribute;
+    const char* widget;
+    long status;
+    bool built;
+  } cases[] = {
+      {"PrevSwitchStd", "checkSwitchStandard", 1, true},
+      {"PrevSwitchStd", "checkSwitchStandard", -1, false},
+      {"PrevUpdateStd", "checkUpdateStandard", 0, true},
+      {"PrevBackgroundAccess", "checkBackgroundView", E_NOTIMPL, false},
+      {"PreventRootUpgrade", "chkPreventRootUpgrade", 2, true},
+      {"PreventViewUpgrade", "chkPrevViewGeomUpgrade", 1, true},
+      {"PreventViewUpgrade", "chkPrevViewGeomUpgrade", -1, false},
+      {"DisableTemplateCreation", "chkDisableTemplateCreation", 1, true},
+      {"DisableGenMfgRequirements", "chkDisableGenMfgRequirements", -5, false},
+      {"SheetNamesUnicity", "checkSheetNamesUnicity", 0, true},
+      {"SheetNamesUnicity", "checkSheetNamesUnicity", 1, false},
+      {"ViewNameUnicityScope", "radViewNameUnicityInLayout", 0, true},
+      {"ViewNameUnicityScope", "radViewNameUnicityInLayout", 1, false},
+      {"CaptureNamesUnicity", "chkCaptureNamesUnicity", 1, false},
+      {"DistinguishCodeInUnicity", "chkDistinguishCodeInUnicity", 0, true},
+      {"EnggConLocation", "radSelectedAssGeomWithAnnotation", 0, true},
+      {"EnggConLocation", "LblEngineeringConnectionLocation", 1, false},
+      // Controls whose status is not looked at.
+      {"PrevViewGeomUpgrade", "chkPrevViewGeomUpgrade", -1, true},
+      {"SelectionOnCurrentAssembly", "radElemUnderCurAssemblyRoot", -1, true},
+      {"ShowWarningSelectionOutAssembly", "chkShowWarningSelectionOutAssembly", -1, true},
+  };
+  for (const auto& c : cases) {
+    _script.allInfoSet = true;
+    _script.info = {{c.attribute, c.status}};
+    Reopen();
+    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, c.widget) != nullptr, c.built)
+        << c.widget << " with " << c.attribute << " info " << c.status;
+  }
+}
+
+TEST_F(AdminPage, EveryCheckOfTheManagementFrameHasARowOfItsOwn) {
+  _script.allInfoSet = true;
+  Open();
+  std::vector<short> rows;
+  for (ZEPDialog* w : ZEPDlgDriver::Find(_pPage, "toolDrwMng")->GetChildren().front()->GetChildren())
+    if (w->GetOwnName() != "lblInv") rows.push_back(w->GetGridConstraints().row);
+  EXPECT_EQ(rows, (std::vector<short>{0, 1, 2, 3, 4, 5, 6, 7}));
+  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "chkPrevViewGeomUpgrade")->GetGridConstraints().column, 1);
+}
+
+TEST_F(AdminPage, EnvironmentSectionShowsTrueDimensionsWithTheirOwnPadlock) {
+  _script.allInfoSet = true;
+  Open();
+  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "toolDress"), nullptr);
+  setenv("ZEP_TDE_LA", "", 1);
+  for (bool trueDimLocked : {true, false}) {
+    // The control built just before is locked exactly when this one is not.
+    _script.locked = {trueDimLocked ? "PrevTrueDim" : "EnggConLocation"};
+    _script.values = {{"PrevTrueDim", {1}}};
+    Reopen();
+    ASSERT_NE(ZEPDlgDriver::Find(_pPage, "toolDress"), nullptr);
+    EXPECT_TRUE(Checked("chkPrevTrueDim"));
+    EXPECT_EQ(Enabled("chkPrevTrueDim"), !trueDimLocked);
+    _script.calls.clear();
+    EXPECT_EQ(ZEPDlgDriver::Click(Control("chkPrevTrueDim")), !trueDimLocked);
+    EXPECT_EQ(Hooks().size(), trueDimLocked ? 0u : 1u);
+  }
+}
+
+TEST_F(AdminPage, RadioGroupsWriteOncePerChange) {
+  _script.allInfoSet = true;
+  _script.values = {{"ViewNamesUnicity", {1}},
+                    {"ViewNameUnicityScope", {5}},
+                    {"SelectionOnCurrentAssembly", {7}},
+                    {"EnggConLocation", {1}}};
+  Open();
+  EXPECT_TRUE(Checked("radViewNameUnicityInLayout"));
+  EXPECT_FALSE(Checked("radViewNameUnicityInSheet"));
+  for (const char* none : {"radElemUnderCurAssemblyRoot", "radElemUnderCurFavContextRoot",
+                           "radAnyRelevantElement"})
+    EXPECT_FALSE(Checked(none)) << none;
+  EXPECT_TRUE(Checked("radSelectedAssGeomWithAnnotation"));
+  const struct {
+    const char* radio;
+    const char* hook;
+    double written; // -1: nothing written
+  } clicks[] = {{"radViewNameUnicityInSheet", "SetSysViewNameUnicityScope", 0},
+                {"radViewNameUnicityInLayout", "SetSysViewNameUnicityScope", 1},
+                {"radAnyRelevantElement", "SetSysSelectionOnCurrentAssembly", 2},
+                {"radElemUnderCurAssemblyRoot", "SetSysSelectionOnCurrentAssembly", 0},
+                {"radElemUnderCurFavContextRoot", "SetSysSelectionOnCurrentAssembly", 1},
+                {"radSelectedAssGeom", "SetSysEnggConLocation", 0},
+                {"radSelectedAssGeomWithAnnotation", "SetSysEnggConLocation", 1},
+                {"radSelectedAssGeomWithAnnotation", "", -1}};
+  for (const auto& c : clicks) {
+    _script.calls.clear();
+    ASSERT_TRUE(ZEPDlgDriver::Click(Control(c.radio))) << c.radio;
+    if (c.written < 0) {
+      EXPECT_TRUE(_script.calls.empty()) << c.radio;
+      continue;
+    }
+    ASSERT_EQ(Hooks(), std::vector<std::string>{c.hook}) << c.radio;
+    EXPECT_EQ(_script.calls[0].values[0], c.written) << c.radio;
+  }
+  // The scope radios follow the view name check.
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkViewNamesUnicity")));
+  EXPECT_FALSE(Enabled("radViewNameUnicityInSheet"));
+  EXPECT_FALSE(Enabled("radViewNameUnicityInLayout"));
+}
+
+TEST_F(AdminPage, ScopeRuleOfTheAssemblyWarningsUnderPadlocks) {
+  const struct {
+    int scope;
+    int warnOut;
+    const char* locked;
+    bool outEnabled, favouriteEnabled;
+  } cases[] = {{0, 0, "", false, false},
+               {1, 0, "", true, false},
+               {2, 0, "", true, true},
+               {2, 1, "", true, false},
+               {2, 0, "ShowWarningSelectionOutFavoriteContext", true, false},
+               {1, 0, "SelectionOnCurrentAssembly", true, false}};
+  for (const auto& c : cases) {
+    _script.allInfoSet = true;
+    _script.locked = {c.locked};
+    _script.values = {{"SelectionOnCurrentAssembly", {double(c.scope)}},
+                      {"ShowWarningSelectionOutAssembly", {double(c.warnOut)}}};
+    Reopen();
+    const std::string when = "scope " + std::to_string(c.scope) + " locked " + c.locked;
+    EXPECT_EQ(Enabled("chkShowWarningSelectionOutAssembly"), c.outEnabled) << when;
+    EXPECT_EQ(Enabled("chkShowWarningSelectionOutFavoriteContext"), c.favouriteEnabled) << when;
+  }
+  // Changing the scope and the out-of-assembly warning applies the rule at once.
+  _script.locked.clear();
+  _script.values = {{"SelectionOnCurrentAssembly", {0}}};
+  Reopen();
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("radAnyRelevantElement")));
+  EXPECT_TRUE(Enabled("chkShowWarningSelectionOutAssembly"));
+  EXPECT_TRUE(Enabled("chkShowWarningSelectionOutFavoriteContext"));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkShowWarningSelectionOutAssembly")));
+  EXPECT_FALSE(Enabled("chkShowWarningSelectionOutFavoriteContext"));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("radElemUnderCurAssemblyRoot")));
+  EXPECT_FALSE(Enabled("chkShowWarningSelectionOutAssembly"));
+}
+
+TEST_F(AdminPage, DistinguishChecksNeedOneUniqueNameCheckAndLocksWin) {
+  _script.allInfoSet = true;
+  _script.values = {{"SheetNamesUnicity", {1}}, {"FilterNamesUnicity", {1}}};
+  _script.locked = {"DistinguishCaseInUnicity"};
+  Open();
+  EXPECT_TRUE(Enabled("chkDistinguishCodeInUnicity"));
+  EXPECT_FALSE(Enabled("chkDistinguishCaseInUnicity"));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkSheetNamesUnicity")));
+  EXPECT_TRUE(Enabled("chkDistinguishCodeInUnicity"));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkFilterNamesUnicity"))); // the last one
+  EXPECT_FALSE(Enabled("chkDistinguishCodeInUnicity"));
+  EXPECT_FALSE(Enabled("chkDistinguishCaseInUnicity"));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkCaptureNamesUnicity")));
+  EXPECT_TRUE(Enabled("chkDistinguishCodeInUnicity"));
+  EXPECT_FALSE(Enabled("chkDistinguishCaseInUnicity")) << "locked";
+  // Dependants of other checks follow them too.
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkPreventGVS")));
+  EXPECT_FALSE(Enabled("chkGVSParamOverride"));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkPreventViewUpgrade")));
+  EXPECT_FALSE(Enabled("chkPrevViewGeomUpgrade"));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkPreventViewUpgrade")));
+  EXPECT_TRUE(Enabled("chkPrevViewGeomUpgrade"));
+}
+
+TEST_F(AdminPage, TemplateCreationWarnsOnEveryToggle) {
+  _script.allInfoSet = true;
+  Open();
+  for (double expected : {1.0, 0.0}) {
+    _script.calls.clear();
+    ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkDisableTemplateCreation")));
+    ASSERT_EQ(Hooks(), std::vector<std::string>{"SetSysDisableTemplateCreation"});
+    EXPECT_EQ(_script.calls[0].values[0], expected);
+    std::vector<ZEPVidFraMessageBox*> boxes = ZEPMessageBoxSetup::OnScreen();
+    ASSERT_EQ(boxes.size(), 1u);
+    ZEPVidFraMessageBox* box = boxes[0];
+    EXPECT_EQ(box->GetOwnName(), "ZEP2DBaseOptAdminFrmMsg");
+    EXPECT_EQ(box->GetTitle().str(), Text("DisableTemplateCreationWng.Title"));
+    EXPECT_EQ(box->GetInformativeText().str(), Text("DisableTemplateCreationWng.Message"));
+    EXPECT_FALSE(box->GetInformativeText().IsEmpty());
+    EXPECT_EQ(box->GetStandardButtons(), 32);
+    EXPECT_EQ(box->GetActionIcon(), 3);
+    EXPECT_TRUE(box->IsModal());
+    EXPECT_FALSE(box->Answer(64)); // no such button
+    EXPECT_TRUE(box->Answer(32));
+    EXPECT_TRUE(ZEPMessageBoxSetup::OnScreen().empty());
+    ZEPDlgDriver::Idle(); // the box closed itself
+    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "ZEP2DBaseOptAdminFrmMsg"), nullptr);
+  }
+  EXPECT_EQ(ZEPMessageBoxSetup::ShownCount(), 2);
+}
+
+TEST_F(AdminPage, FolderIsWrittenWhenItsTextChanges) {
+  _script.texts = {{"FolderTitleBlock", "/srv/frames"}};
+  Open();
+  auto* editor = ZEPSysDynamicCast<ZEPDlgEditor>(Control("FrameAndTitleBlockPath"));
+  ASSERT_NE(editor, nullptr);
+  EXPECT_EQ(editor->GetText().str(), "/srv/frames");
+  for (const char* text : {"/srv/frames", "/srv/titles", "/srv/titles", ""})
+    ASSERT_TRUE(ZEPDlgDriver::EnterText(editor, text));
+  ASSERT_EQ(Hooks(), std::vector<std::string>(2, "SetSysFolderTitleBlock"));
+  EXPECT_EQ(_script.calls[0].text, "/srv/titles");
+  EXPECT_EQ(_script.calls[1].text, "");
+}
+
+// ---- property toolbar behaviour dialog -----------------------------------------------------
+TEST_F(AdminPage, BehaviorDialogShowsOnlyRowsWhoseInfoAnswersZero) {
+  Open();
+  ZEPDlgDialog* dialog = PushBehavior();
+  ASSERT_NE(dialog, nullptr);
+  EXPECT_EQ(dialog->GetStyle(), 0x11400201u);
+  EXPECT_EQ(ZEPDlgDriver::Find(dialog, "lblPropertyBehavior")->GetGridConstraints().row, 0);
+  EXPECT_EQ(ZEPDlgDriver::Find(dialog, "cmbDrwTbFontName"), nullptr);
+  ZEPDlgDriver::CloseDialog(dialog);
+  ZEPDlgDriver::Idle();
+
+  _script.allInfoSet = true;
+  _script.info = {{"DrwTbBold", 1}, {"DrwTbPattern", -1}};
+  Reopen();
+  dialog = PushBehavior();
+  int rows = 0;
+  for (const std::string& name : kBehaviors) {
+    if (name.rfind("DrwTb", 0) != 0) continue;
+    ZEPDialog* combo = ZEPDlgDriver::Find(dialog, "cmb" + name);
+    const bool shown = name != "DrwTbBold" && name != "DrwTbPattern";
+    ASSERT_EQ(combo != nullptr, shown) << name;
+    if (!shown) continue;
+    // Rows move up past the missing ones.
+    EXPECT_EQ(combo->GetGridConstraints().row, ++rows) << name;
+    EXPECT_EQ(ZEPDlgDriver::Find(dialog, "lbl" + name)->GetGridConstraints().row, rows) << name;
+  }
+  EXPECT_EQ(rows, 17);
+}
+
+TEST_F(AdminPage, BehaviorLinesAndConversionsWithAndWithoutGVS) {
+  const std::string fix = Text("fix"), elem = Text("elemtype"), style = Text("style"),
+                    none = Text("nooverload");
+  const std::vector<std::string> all = {fix, elem, style, none}, shifted = {elem, style, none},
+                                 noElem = {fix, style, none};
+  const struct {
+    const char* row;
+    int gvs;
+    std::vector<std::string> lines;
+    double stored;
+    int shown;     // selected line
+    int chosen;    // line picked by the user
+    double written;
+  } cases[] = {
+      {"DrwTbFontName", 1, all, 2, 2, 3, 3},
+      {"DrwTbFrame", 1, shifted, 0, -1, 0, 1},
+      {"DrwTbNumDispDesc", 0, shifted, 3, 2, 1, 2},
+      {"DrwTbColor", 0, noElem, 1, 0, 1, 2},
+      {"DrwTbColor", 1, all, 1, 1, 0, 0},
+      {"DrwTbPointType", 0, noElem, 0, 0, 2, 3},
+      {"DrwTbPattern", 1, noElem, 3, 2, 0, 0},
+      {"DrwTbPattern", 0, noElem, 2, 1, 1, 2},
+  };
+  for (const auto& c : cases) {
+    _script.allInfoSet = true;
+    _script.options = {{"WithFrmGVS", c.gvs}};
+    _script.values = {{c.row, {c.stored}}};
+    Reopen();
+    ZEPDlgDialog* dialog = PushBehavior();
+    ASSERT_NE(dialog, nullptr);
+    const std::string combo = std::string("cmb") + c.row;
+    const std::string when = combo + " gvs " + std::to_string(c.gvs);
+    EXPECT_EQ(Lines(combo), c.lines) << when;
+    EXPECT_EQ(Combo(combo)->GetSelect(), c.shown) << when;
+    _script.calls.clear();
+    ASSERT_TRUE(ZEPDlgDriver::Select(Combo(combo), c.chosen)) << when;
+    ASSERT_EQ(Hooks(), std::vector<std::string>{std::string("SetSys") + c.row}) << when;
+    EXPECT_EQ(_script.calls[0].values[0], c.written) << when;
+  }
+}
+
+TEST_F(AdminPage, GVSIsAskedAtEveryConversionAndLine) {
+  _script.allInfoSet = true;
+  Open();
+  const int afterOpen = WithFrmGVSCalls();
+  EXPECT_EQ(afterOpen, 1 + 4) << "the frame, then the four rows that depend on it";
+  PushBehavior();
+  EXPECT_EQ(WithFrmGVSCalls(), afterOpen + 4);
+  ASSERT_TRUE(ZEPDlgDriver::Select(Combo("cmbDrwTbLineType"), 1));
+  ASSERT_TRUE(ZEPDlgDriver::Select(Combo("cmbDrwTbLineType"), 2));
+  ASSERT_TRUE(ZEPDlgDriver::Select(Combo("cmbDrwTbBold"), 2));
+  EXPECT_EQ(WithFrmGVSCalls(), afterOpen + 6);
+}
+
+TEST_F(AdminPage, BehaviorDialogPlacementIsRestoredAndSaved) {
+  _script.allInfoSet = true;
+  Open();
+  // Without the preference repository the toolkit's placement stays, and nothing is saved.
+  ZEPDlgDialog* dialog = PushBehavior();
+  ZEPRect rect;
+  dialog->GetRectDimensions(&rect);
+  const ZEPRect toolkit = rect;
+  ASSERT_TRUE(ZEPDlgDriver::Close(dialog));
+  ZEPDlgDriver::Idle();
+
+  ZEPSysPreferenceRepository* prefs = ZEPSysPreferenceRepository::Open("DraftingOptions");
+  const char* const keys[] = {"dlgPropTbBehaviorX", "dlgPropTbBehaviorY", "dlgPropTbBehaviorWidth",
+                              "dlgPropTbBehaviorHeight"};
+  const struct {
+    std::vector<int> stored; // empty: no key
+    ZEPRect shown;
+  } cases[] = {{{}, {440, 240, 440, 595}},
+               {{10, 20, 300, 400}, {10, 20, 300, 400}},
+               {{10, 20, 0, 400}, {440, 240, 440, 595}},
+               {{10, 20, 300, -4}, {440, 240, 440, 595}}};
+  for (const auto& c : cases) {
+    for (int i = 0; i < 4; ++i) {
+      prefs->ResetAttr(keys[i]);
+      if (!c.stored.empty()) prefs->WritePreference(keys[i], &c.stored[i]);
+    }
+    dialog = PushBehavior();
+    dialog->GetRectDimensions(&rect);
+    EXPECT_EQ(std::vector<int>({rect.x, rect.y, rect.dx, rect.dy}),
+              std::vector<int>({c.shown.x, c.shown.y, c.shown.dx, c.shown.dy}));
+    // The user moves it; closing keeps the new place for the next opening.
+    dialog->SetRectDimensions(ZEPRect{5, 6, 700, 800});
+    ASSERT_TRUE(ZEPDlgDriver::CloseDialog(dialog));
+    ZEPDlgDriver::Idle();
+    int saved[4] = {};
+    for (int i = 0; i < 4; ++i)
+      prefs->ReadPreference(keys[i], &saved[i]);
+    EXPECT_EQ(std::vector<int>(saved, saved + 4), (std::vector<int>{5, 6, 700, 800}));
+    EXPECT_FALSE(prefs->IsModified()) << "saved";
+  }
+  EXPECT_NE(std::vector<int>({toolkit.x, toolkit.y, toolkit.dx, toolkit.dy}),
+            std::vector<int>({5, 6, 700, 800}));
+
+  // A host without a repository to save in keeps the stored place.
+  _script.texts["SaveTo"] = "";
+  dialog = PushBehavior();
+  dialog->SetRectDimensions(ZEPRect{1, 2, 3, 4});
+  ASSERT_TRUE(ZEPDlgDriver::CloseDialog(dialog));
+  int width = 0;
+  prefs->ReadPreference("dlgPropTbBehaviorWidth", &width);
+  EXPECT_EQ(width, 700);
+}
+
+TEST_F(AdminPage, SecondPushShowsTheOpenDialogAndClosingForgetsItsCombos) {
+  _script.allInfoSet = true;
+  _script.values = {{"DrwTbItalic", {3}}};
+  Open();
+  ZEPDlgDialog* dialog = PushBehavior();
+  dialog->SetVisibility(ZEPDlgHide);
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("pushPropTbBehavior")));
+  int dialogs = 0;
+  for (ZEPDialog* child : _pPage->GetChildren())
+    dialogs += child->GetOwnName() == "dlgPropTbBehavior" ? 1 : 0;
+  EXPECT_EQ(dialogs, 1);
+  EXPECT_EQ(dialog->GetVisibility(), ZEPDlgShow);
+  ZEPDlgCombo* italic = Combo("cmbDrwTbItalic");
+  ASSERT_TRUE(ZEPDlgDriver::Select(italic, 1));
+  ASSERT_TRUE(ZEPDlgDriver::Close(dialog));
+  ASSERT_TRUE(ZEPDlgDriver::Select(italic, 2)); // closed, not yet destroyed: not written
+  EXPECT_EQ(Hooks(), std::vector<std::string>{"SetSysDrwTbItalic"});
+  ZEPDlgDriver::Idle();
+  // Reopened, it shows the last value written.
+  PushBehavior();
+  EXPECT_EQ(Combo("cmbDrwTbItalic")->GetSelect(), 1);
+  EXPECT_EQ(ZEPCheckLog::Count(), 0);
+}
+
+TEST_F(AdminPage, AllInfoHooksAnsweringZeroWithTheDialog) {
+  _script.allInfoSet = true;
+  _script.locked = {"ViewNameUnicityScope", "DrwTbSymbol"};
+  _script.values = {{"ViewNamesUnicity", {1}}, {"SelectionOnCurrentAssembly", {2}},
+                    {"PrevGenViewStyle", {1}}, {"DrwTbColor", {2}}};
+  _script.texts = {{"FolderTitleBlock", "/srv/frames"}};
+  setenv("ZEP_TDE_LA", "1", 1);
+  Open();
+  std::string dump = ZEPDlgDriver::Dump(_pPage);
+  dump += ZEPDlgDriver::Dump(PushBehavior());
+  ExpectGolden("admin_page_info_zero.dump", dump);
+}
