@@ -1,6 +1,7 @@
 #include "ZEPAppCli.h"
 
 #include "ZEPAppInfo.h"
+#include "ZEPAppKeys.h"
 #include "ZEPAppPages.h"
 #include "ZEPAppRender.h"
 #include "ZEPAppSettingsFile.h"
@@ -8,12 +9,15 @@
 #include "ZEPAppSketcher.h"
 
 #include <CLI/CLI.hpp>
+#include <nlohmann/json.hpp>
 
 #include <algorithm>
 #include <cctype>
 #include <filesystem>
 #include <map>
 #include <memory>
+#include <optional>
+#include <sstream>
 
 namespace zepapp {
 
@@ -43,9 +47,92 @@ struct Request {
   std::string settings, admin;
   std::string page, control, value, attribute, html;
   std::vector<std::string> pages;
+  std::vector<std::string> args; // a setting's key, then its value where one is taken
+  bool hasValue = false;
   int range = 0; // 0: the range the grid page opens on
-  bool all = false;
+  bool all = false, json = false, raw = false, remove = false;
 };
+
+// Takes the setting named at the start of the request's arguments (PAGE CONTROL, PAGE.CONTROL
+// or its stored attribute) and between iMin and iMax values after it.
+int TakeKey(Request& ioRequest, std::size_t iMin, std::size_t iMax, std::ostream& err) {
+  ZEPAppKey key;
+  std::size_t used = 0;
+  std::string error;
+  if (!ResolveKey(ioRequest.args, key, used, error)) {
+    err << "error: " << error << "\n";
+    return kExitUsage;
+  }
+  const std::size_t values = ioRequest.args.size() - used;
+  if (values < iMin || values > iMax) {
+    err << "error: " << (values < iMin ? "a value is needed after " : "too many values after ") << key.page->name
+        << "." << key.control << "\n";
+    return kExitUsage;
+  }
+  ioRequest.page = key.page->name;
+  ioRequest.control = key.control;
+  ioRequest.hasValue = values > 0;
+  ioRequest.value = values > 0 ? ioRequest.args[used] : "";
+  ioRequest.attribute = key.setting ? key.setting->stored : "";
+  return kExitOk;
+}
+
+const char* KindName(ZEPAppKind iKind) {
+  switch (iKind) {
+  case ZEPAppKind::Check:
+    return "check";
+  case ZEPAppKind::Spinner:
+    return "spinner";
+  case ZEPAppKind::Combo:
+    return "combo";
+  case ZEPAppKind::Choice:
+    return "choice";
+  case ZEPAppKind::Push:
+    return "button";
+  case ZEPAppKind::Other:
+    break;
+  }
+  return "other";
+}
+
+// The values a repository reads for an attribute, as JSON numbers; null when it has none.
+nlohmann::json StoredJson(const ZEPAppSetting& iSetting) {
+  const ZEPSysSettingRepository* repo = ZEPSysSettingRepository::GetRepository(iSetting.repository.c_str());
+  const ZEPAppValue* value = repo ? repo->Effective(iSetting.stored) : nullptr;
+  if (!value) return nullptr;
+  return std::visit([](const auto& v) { return nlohmann::json(v); }, *value);
+}
+
+// The stored values as text, shortest forms that read back exactly.
+std::string StoredText(const ZEPAppSetting& iSetting) {
+  std::string text;
+  for (const auto& v : StoredJson(iSetting)) text += (text.empty() ? "" : " ") + FormatNumber(v.get<double>());
+  return text;
+}
+
+// One control as the JSON of show, get and list.
+nlohmann::json ControlJson(const ZEPAppPage& iPage, const std::vector<ZEPAppControl>& iControls,
+                           const ZEPAppControl& iControl) {
+  const ZEPAppSetting* setting = SettingOf(iPage, iControl.name);
+  nlohmann::json j = {{"page", iPage.name},
+                      {"control", iControl.name},
+                      {"key", iPage.name + "." + iControl.name},
+                      {"title", iControl.Title()},
+                      {"kind", KindName(iControl.Kind())},
+                      {"section", iControl.section},
+                      {"shown", iControl.Shown()},
+                      {"locked", iControl.Locked()},
+                      {"lockedBy", iControl.LockText()},
+                      {"enabled", !iControl.Disabled()},
+                      {"whyNot", WhyRefused(iControls, iControl)}};
+  j["attribute"] = setting ? nlohmann::json(setting->stored) : nlohmann::json(nullptr);
+  if (setting) {
+    j["repository"] = setting->repository;
+    j["stored"] = StoredJson(*setting);
+    j["default"] = setting->defaults;
+  }
+  return j;
+}
 
 // One run of the application: the settings files, the repositories bound to them and the
 // pages opened on a top-level window.
@@ -93,9 +180,10 @@ public:
   // The page of that name, or null after listing the valid ones.
   const ZEPAppPage* Page(const std::string& iName) {
     if (const ZEPAppPage* page = FindPage(Lower(iName))) return page;
-    _err << "error: unknown page " << Quoted(iName) << "; the pages are:";
-    for (const ZEPAppPage& p : AppPages())
-      _err << " " << p.name;
+    std::vector<std::string> names;
+    for (const ZEPAppPage& p : AppPages()) names.push_back(p.name);
+    _err << "error: unknown page " << Quoted(iName) << "." << DidYouMean(iName, names) << " The pages are:";
+    for (const std::string& name : names) _err << " " << name;
     _err << "\n";
     return nullptr;
   }
@@ -137,8 +225,10 @@ public:
   const ZEPAppControl* Control(const ZEPAppPage& iPage, const std::vector<ZEPAppControl>& iControls,
                                const std::string& iName) {
     if (const ZEPAppControl* control = FindPageControl(iControls, iName)) return control;
-    _err << "error: unknown control " << Quoted(iName) << " on page " << iPage.name
-         << "; its controls are:\n";
+    std::vector<std::string> names;
+    for (const ZEPAppControl& c : iControls) names.push_back(c.name);
+    _err << "error: unknown control " << Quoted(iName) << " on page " << iPage.name << "."
+         << DidYouMean(iName, names) << " Its controls are:\n";
     std::size_t width = 0;
     for (const ZEPAppControl& c : iControls)
       width = std::max(width, c.name.size());
@@ -158,11 +248,16 @@ public:
     if (int range = ShownRange(iControls))
       _out << "  scale range " << range << ": " << ScaleName(range);
     _out << "\n";
-    std::size_t nameWidth = 0, titleWidth = 0, valueWidth = 0;
+    std::size_t nameWidth = 0, titleWidth = 0, valueWidth = 0, attributeWidth = 0;
+    auto attribute = [&iPage](const ZEPAppControl& c) {
+      const ZEPAppSetting* s = SettingOf(iPage, c.name);
+      return s ? s->stored : std::string("-");
+    };
     for (const ZEPAppControl& c : iControls) {
       nameWidth = std::max(nameWidth, c.name.size());
       titleWidth = std::max(titleWidth, TextWidth(c.Title()));
       valueWidth = std::max(valueWidth, TextWidth(c.Shown()));
+      attributeWidth = std::max(attributeWidth, attribute(c).size());
     }
     std::string section = "\x01"; // no section yet
     for (const ZEPAppControl& c : iControls) {
@@ -178,9 +273,12 @@ public:
         marks += "  (disabled)";
       std::string line = "    ";
       if (iWithNames) line += Pad(c.name, nameWidth) + "  ";
-      line += Pad(c.Title(), titleWidth) + "  " +
-              (marks.empty() ? c.Shown() : Pad(c.Shown(), valueWidth) + marks);
-      _out << line << "\n";
+      line += Pad(c.Title(), titleWidth) + "  ";
+      if (iWithNames)
+        line += Pad(c.Shown(), valueWidth) + "  " + (marks.empty() ? attribute(c) : Pad(attribute(c), attributeWidth));
+      else
+        line += marks.empty() ? c.Shown() : Pad(c.Shown(), valueWidth);
+      _out << line + marks << "\n";
     }
   }
 
@@ -220,7 +318,13 @@ int Overview(const Request& iRequest, std::ostream& out, std::ostream& err) {
   return kExitOk;
 }
 
-int ListPages(std::ostream& out) {
+int ListPages(const Request& iRequest, std::ostream& out) {
+  if (iRequest.json) {
+    nlohmann::json all = nlohmann::json::array();
+    for (const ZEPAppPage& p : AppPages()) all.push_back({{"page", p.name}, {"title", p.title}});
+    out << all.dump(2) << "\n";
+    return kExitOk;
+  }
   std::size_t width = 0;
   for (const ZEPAppPage& p : AppPages())
     width = std::max(width, p.name.size());
@@ -242,7 +346,14 @@ int Show(const Request& iRequest, std::ostream& out, std::ostream& err) {
   const ZEPAppPage* page = nullptr;
   std::vector<ZEPAppControl> controls;
   if (int rc = session.Target(iRequest, false, page, controls, nullptr)) return rc;
-  session.Print(*page, controls, true);
+  if (!iRequest.json) {
+    session.Print(*page, controls, true);
+    return kExitOk;
+  }
+  nlohmann::json j = {{"page", page->name}, {"title", page->title}, {"range", ShownRange(controls)}};
+  j["controls"] = nlohmann::json::array();
+  for (const ZEPAppControl& c : controls) j["controls"].push_back(ControlJson(*page, controls, c));
+  out << j.dump(2) << "\n";
   return kExitOk;
 }
 
@@ -252,16 +363,41 @@ int Get(const Request& iRequest, std::ostream& out, std::ostream& err) {
   std::vector<ZEPAppControl> controls;
   const ZEPAppControl* control = nullptr;
   if (int rc = session.Target(iRequest, false, page, controls, &control)) return rc;
-  out << control->Shown() << "\n";
+  const ZEPAppSetting* setting = SettingOf(*page, control->name);
+  if (iRequest.json)
+    out << ControlJson(*page, controls, *control).dump(2) << "\n";
+  else if (iRequest.raw && setting)
+    out << StoredText(*setting) << "\n";
+  else if (iRequest.raw)
+    out << control->Shown() << "\n"; // a control without setting stores nothing
+  else
+    out << control->Shown() << "\n";
   return kExitOk;
 }
 
-// The stored setting behind a control, from the settings table; null for a control that only
-// changes what the page shows (the scale range, a push button).
-const ZEPAppSetting* SettingOf(const ZEPAppPage& iPage, const ZEPAppControl& iControl) {
-  for (const ZEPAppSetting& s : AppSettings())
-    if (iPage.Shows(s) && s.control == iControl.name) return &s;
-  return nullptr;
+// Every setting of every page, its dialogs' included: one line each, or JSON.
+int List(const Request& iRequest, std::ostream& out, std::ostream& err) {
+  Session session(out, err);
+  if (int rc = session.Start(iRequest, false)) return rc;
+  nlohmann::json all = nlohmann::json::array();
+  for (const ZEPAppPage& page : AppPages()) {
+    std::vector<ZEPAppControl> controls;
+    if (int rc = session.Controls(page, 0, controls)) return rc;
+    for (const ZEPAppControl& c : controls) {
+      const ZEPAppSetting* setting = SettingOf(page, c.name);
+      if (!setting || setting->page != page.table) continue; // an embedded page's: listed on its own page
+      if (iRequest.json) {
+        all.push_back(ControlJson(page, controls, c));
+        continue;
+      }
+      out << page.name << "." << c.name << "  " << setting->stored << "  " << c.Shown();
+      if (c.Locked()) out << "  (locked: " << c.LockText() << ")";
+      else if (c.Disabled()) out << "  (disabled)";
+      out << "\n";
+    }
+  }
+  if (iRequest.json) out << all.dump(2) << "\n";
+  return kExitOk;
 }
 
 int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
@@ -282,7 +418,7 @@ int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
     return kExitFile;
   }
   out << outcome.message;
-  const ZEPAppSetting* setting = SettingOf(*page, *control);
+  const ZEPAppSetting* setting = SettingOf(*page, control->name);
   if (setting && setting->defaults.size() > 1 && range)
     out << "  (scale range " << range << ": " << ScaleName(range) << ")";
   if (!setting) out << "  (only for this run: it stores nothing; --range N chooses a range)";
@@ -319,7 +455,7 @@ int Reset(const Request& iRequest, std::ostream& out, std::ostream& err) {
   if (int rc = session.Controls(*page, 0, controls)) return rc;
   const ZEPAppControl* control = session.Control(*page, controls, iRequest.control);
   if (!control) return kExitUsage;
-  const ZEPAppSetting* setting = SettingOf(*page, *control);
+  const ZEPAppSetting* setting = SettingOf(*page, control->name);
   if (!setting) {
     err << "error: " << Quoted(control->Title()) << " (" << control->name
         << ") keeps no setting of its own\n";
@@ -348,54 +484,156 @@ int Reset(const Request& iRequest, std::ostream& out, std::ostream& err) {
   return kExitOk;
 }
 
-const ZEPAppSetting* Attribute(const std::string& iName, std::ostream& err) {
-  for (const ZEPAppSetting& s : AppSettings())
-    if (s.stored == iName) return &s;
-  for (const ZEPAppSetting& s : AppSettings())
-    if (Lower(s.stored) == Lower(iName)) return &s;
-  err << "error: unknown attribute " << Quoted(iName) << "; the attributes are:\n";
-  std::size_t width = 0;
-  for (const ZEPAppSetting& s : AppSettings())
-    width = std::max(width, s.stored.size());
-  for (const ZEPAppSetting& s : AppSettings()) {
-    std::string page = s.page;
-    for (const ZEPAppPage& p : AppPages())
-      if (p.table == s.page) page = p.name;
-    err << "  " << Pad(s.stored, width) << "  " << page << " " << s.control << "\n";
-  }
-  return nullptr;
-}
+enum class AdminAction { Lock, Unlock, Default, RemoveDefault };
 
-int LockOrUnlock(const Request& iRequest, bool iLock, std::ostream& out, std::ostream& err) {
-  const ZEPAppSetting* setting = Attribute(iRequest.attribute, err);
-  if (!setting) return kExitUsage;
+// lock KEY [VALUE], unlock KEY, default KEY VALUE and default --remove KEY: the administrator's
+// file. A value is taken as set takes it, by operating the control on this run only (nothing is
+// written to the user's file), then recorded in the administrator's file.
+int Administer(const Request& iRequest, AdminAction iAction, std::ostream& out, std::ostream& err) {
   Session session(out, err);
-  if (int rc = session.Start(iRequest, true)) return rc;
+  const ZEPAppPage* page = nullptr;
+  std::vector<ZEPAppControl> controls;
+  const ZEPAppControl* control = nullptr;
+  if (int rc = session.Target(iRequest, true, page, controls, &control)) return rc;
   if (session.Paths().admin.empty()) {
     err << "error: no administrator's file: give --admin FILE or set " << kAdminFileEnv << "\n";
     return kExitUsage;
   }
-  const long rc = iLock ? session.File().Lock(setting->repository, setting->stored)
-                        : session.File().Unlock(setting->repository, setting->stored);
+  const ZEPAppSetting* setting = SettingOf(*page, control->name);
+  if (!setting) {
+    err << "error: " << Quoted(control->Title()) << " (" << control->name << ") keeps no setting of its own\n";
+    return kExitUsage;
+  }
+  ZEPSysSettingRepository* repo = ZEPSysSettingRepository::GetRepository(setting->repository.c_str());
+  std::optional<ZEPAppValue> value;
+  if (iRequest.hasValue && repo) {
+    if (repo->IsLocked(setting->stored)) { // a new value for a lock: the control must take it first
+      repo->SetLock(setting->stored, false);
+      const std::string name = control->name;
+      session.Open(*page, true);
+      if (int rc = session.Controls(*page, iRequest.range, controls)) return rc;
+      control = FindPageControl(controls, name);
+      if (!control) return kExitFailure;
+    }
+    const ZEPAppOutcome outcome = OperateControl(controls, *control, iRequest.value);
+    CloseSubDialog(*control);
+    if (outcome.code != kExitOk) {
+      err << "error: " << outcome.message << "\nnothing was changed\n";
+      return outcome.code;
+    }
+    if (const ZEPAppValue* now = repo->Effective(setting->stored)) value = *now;
+  }
+  const std::string& repository = setting->repository;
+  const std::string& attribute = setting->stored;
+  long rc = S_OK;
+  switch (iAction) {
+  case AdminAction::Lock:
+    rc = value ? session.File().Lock(repository, attribute, *value) : session.File().Lock(repository, attribute);
+    break;
+  case AdminAction::Unlock:
+    rc = session.File().Unlock(repository, attribute);
+    break;
+  case AdminAction::Default:
+    rc = value ? session.File().SetAdminDefault(repository, attribute, *value) : E_FAIL;
+    break;
+  case AdminAction::RemoveDefault:
+    rc = session.File().RemoveAdminDefault(repository, attribute);
+    break;
+  }
   if (FAILED(rc)) {
     err << "error: " << session.File().LastError() << "\n";
     return kExitFile;
   }
-  if (!iLock && rc == 1) {
-    out << setting->stored << " was not locked; nothing changed\n";
+  if (rc == 1) {
+    out << attribute << (iAction == AdminAction::Unlock ? " was not locked" : " had no default")
+        << "; nothing changed\n";
     return kExitOk;
   }
   // What the page shows now, padlock included.
-  std::string shown;
-  for (const ZEPAppPage& p : AppPages())
-    if (p.table == setting->page) {
-      const std::vector<ZEPAppControl> controls = PageControls(session.Open(p), p.dialogButtons);
-      if (const ZEPAppControl* c = FindPageControl(controls, setting->control))
-        shown = c->Title() + " (" + p.name + " " + c->name + ") = " + c->Shown();
-    }
-  out << (iLock ? "Locked " : "Unlocked ") << setting->stored << " in "
+  const std::string name = control->name;
+  session.Open(*page, true);
+  if (int rc2 = session.Controls(*page, iRequest.range, controls)) return rc2;
+  const ZEPAppControl* shown = FindPageControl(controls, name);
+  static const char* const kDone[] = {"Locked ", "Unlocked ", "Default for everyone of ", "Removed the default of "};
+  out << kDone[static_cast<int>(iAction)] << attribute << " (" << page->name << "." << name << ") in "
       << session.File().AdminPath() << "\n";
-  if (!shown.empty()) out << "  " << shown << "\n";
+  if (iAction == AdminAction::RemoveDefault)
+    out << "  the application's own default applies from the next command on\n";
+  else if (shown)
+    out << "  " << shown->Title() << " = " << shown->Shown() << "\n";
+  return kExitOk;
+}
+
+// Every lock and default of the administrator's file, with who locked it.
+int Locks(const Request& iRequest, std::ostream& out, std::ostream& err) {
+  Session session(out, err);
+  if (int rc = session.Start(iRequest, false)) return rc;
+  nlohmann::json all = nlohmann::json::array();
+  for (const auto& [repository, entries] : session.File().AdminDoc().settings)
+    for (const auto& [attribute, entry] : entries) {
+      std::string key;
+      for (const ZEPAppSetting& s : AppSettings())
+        if (s.repository == repository && s.stored == attribute)
+          if (const ZEPAppPage* p = PageOf(s)) key = p->name + "." + s.control;
+      nlohmann::json value = nullptr;
+      if (entry.value) value = std::visit([](const auto& v) { return nlohmann::json(v); }, *entry.value);
+      all.push_back({{"repository", repository},
+                     {"attribute", attribute},
+                     {"key", key.empty() ? nlohmann::json(nullptr) : nlohmann::json(key)},
+                     {"locked", entry.locked},
+                     {"by", entry.by},
+                     {"value", value}});
+    }
+  if (iRequest.json) {
+    out << all.dump(2) << "\n";
+    return kExitOk;
+  }
+  out << "Administrator's file: " << (session.Paths().admin.empty() ? "none" : session.Paths().admin) << "\n";
+  if (all.empty()) out << "  no lock and no default\n";
+  for (const auto& e : all) {
+    std::string values;
+    for (const auto& v : e["value"]) values += (values.empty() ? "" : " ") + FormatNumber(v.get<double>());
+    out << "  " << e["attribute"].get<std::string>() << "  "
+        << (e["key"].is_null() ? std::string("(no control)") : e["key"].get<std::string>()) << "  " << values << "  "
+        << (e["locked"].get<bool>() ? "locked by " + e["by"].get<std::string>() : std::string("default")) << "\n";
+  }
+  return kExitOk;
+}
+
+// A bash completion script: commands, pages, each page's controls and the stored attributes.
+int Completion(std::ostream& out) {
+  std::string pages, keys;
+  std::ostringstream perPage;
+  ZEPAppSettingsFile file; // no files: the application's defaults
+  for (const std::string& name : AppRepositories()) file.OpenSettings(name);
+  ApplyDefaults();
+  ZEPDlgWindow root(nullptr, "DraftingOptions", 0);
+  for (const ZEPAppPage& page : AppPages()) {
+    pages += " " + page.name;
+    std::string controls;
+    for (const ZEPAppControl& c : PageControls(page.open(&root), page.dialogButtons)) {
+      controls += " " + c.name;
+      keys += " " + page.name + "." + c.name;
+    }
+    perPage << "    " << page.name << ") words=\"" << controls.substr(controls.empty() ? 0 : 1) << "\" ;;\n";
+  }
+  for (const ZEPAppSetting& s : AppSettings()) keys += " " + s.stored;
+  ZEPDlgDriver::Idle();
+  out << "# bash completion for " << kAppName << ": source it, or put it in ~/.local/share/bash-completion/completions/\n"
+      << "_drafting_options() {\n"
+      << "  local cur=${COMP_WORDS[COMP_CWORD]} prev=${COMP_WORDS[COMP_CWORD-1]} words\n"
+      << "  local commands=\"pages show get set reset lock unlock default locks list render sketcher completion\"\n"
+      << "  local pages=\"" << pages.substr(1) << "\"\n"
+      << "  local keys=\"" << keys.substr(1) << "\"\n"
+      << "  case \"$prev\" in\n"
+      << "    drafting-options) words=\"$commands\" ;;\n"
+      << "    show|render) words=\"$pages\" ;;\n"
+      << "    get|set|reset|lock|unlock|default) words=\"$pages $keys\" ;;\n"
+      << perPage.str() << "    *) words=\"\" ;;\n"
+      << "  esac\n"
+      << "  COMPREPLY=($(compgen -W \"$words\" -- \"$cur\"))\n"
+      << "}\n"
+      << "complete -F _drafting_options " << kAppName << "\n";
   return kExitOk;
 }
 
@@ -473,58 +711,113 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
         ->check(CLI::Range(1, 5));
   };
 
+  const std::string keyHelp = "The setting: PAGE CONTROL, PAGE.CONTROL or its stored attribute (see show)";
+  const std::string valueHelp =
+      "on/off for a check box; a number with an optional unit (25mm, 2.5cm, 1in, 15deg) for a spinner; a line "
+      "number from 1 or a line's text for a combo or a group of radio buttons";
+  auto keyArgs = [&r](CLI::App* cmd, const std::string& iHelp, int iMin, int iMax) {
+    cmd->add_option("key", r.args, iHelp)->expected(iMin, iMax);
+  };
+  auto jsonFlag = [&r](CLI::App* cmd) { cmd->add_flag("--json", r.json, "Machine-readable output (JSON)"); };
+
   CLI::App* pages = app.add_subcommand("pages", "List the pages");
+  jsonFlag(pages);
   CLI::App* show =
-      app.add_subcommand("show", "Show a page: each control's name, title, value and padlock");
+      app.add_subcommand("show", "Show a page: each control's name, title, value, attribute and padlock");
   show->add_option("page", r.page, "Page name")->required();
   rangeOption(show);
+  jsonFlag(show);
+  show->footer("Examples:\n  " + std::string(kAppName) + " show grid --range 2\n  " + kAppName +
+               " show geometry --json");
   CLI::App* get = app.add_subcommand("get", "Print the value a control shows");
-  get->add_option("page", r.page, "Page name")->required();
-  get->add_option("control", r.control, "Control name (see show)")->required();
+  keyArgs(get, keyHelp, 1, 2);
   rangeOption(get);
-  CLI::App* set =
-      app.add_subcommand("set", "Operate a control with a value, as a user would, and save");
-  set->add_option("page", r.page, "Page name")->required();
-  set->add_option("control", r.control, "Control name (see show)")->required();
-  set->add_option(
-         "value", r.value,
-         "on/off for a check box; a number with an optional unit (25mm, 2.5cm, 1in, 15deg) for a "
-         "spinner; a line number from 1 or a line's text for a combo or a group of radio buttons")
-      ->required();
+  jsonFlag(get);
+  get->add_flag("--raw", r.raw, "The stored value (millimetres, degrees, codes) rather than what is shown");
+  get->footer("Examples:\n  " + std::string(kAppName) + " get general cmbPaperLengthUnit\n  " + kAppName +
+              " get general.spinnerViewAxisSize --raw\n  " + kAppName + " get DrwPaperLengthUnit --json");
+  CLI::App* set = app.add_subcommand("set", "Operate a control with a value, as a user would, and save");
+  keyArgs(set, keyHelp + ", then the value: " + valueHelp, 2, 3);
   rangeOption(set);
-  CLI::App* reset =
-      app.add_subcommand("reset", "Put a setting back to its default (every scale range), or all");
-  reset->add_option("page", r.page, "Page name");
-  reset->add_option("control", r.control, "Control name (see show)");
+  set->footer("Examples:\n  " + std::string(kAppName) + " set grid editorGridSpacing 2.5cm --range 2\n  " +
+              kAppName + " set general.checkViewFrame off\n  " + kAppName + " set DrwPaperLengthUnit inch");
+  CLI::App* reset = app.add_subcommand("reset", "Put a setting back to its default (every scale range), or all");
+  keyArgs(reset, keyHelp, 0, 2);
   reset->add_flag("--all", r.all, "Every setting the administrator has not locked");
-  CLI::App* lock =
-      app.add_subcommand("lock", "Lock a setting at its current value in the administrator's file");
-  lock->add_option("attribute", r.attribute, "Stored attribute name, such as DrwPaperLengthUnit")
-      ->required();
-  CLI::App* unlock = app.add_subcommand("unlock", "Unlock a setting in the administrator's file");
-  unlock->add_option("attribute", r.attribute, "Stored attribute name")->required();
-  CLI::App* sketcher =
-      app.add_subcommand("sketcher", "Print the sketcher settings read from the same files");
+  reset->footer("Examples:\n  " + std::string(kAppName) + " reset grid editorGridSpacing\n  " + kAppName +
+                " reset --all");
+  CLI::App* lock = app.add_subcommand(
+      "lock", "Lock a setting for everyone in the administrator's file, at VALUE or at its current value");
+  keyArgs(lock, keyHelp + ", then an optional value: " + valueHelp, 1, 3);
+  rangeOption(lock);
+  lock->footer("Examples:\n  " + std::string(kAppName) + " lock general cmbPaperLengthUnit mm\n  " + kAppName +
+               " lock DrwViewFrame");
+  CLI::App* unlock = app.add_subcommand("unlock", "Unlock a setting; the administrator's value stays as a default");
+  keyArgs(unlock, keyHelp, 1, 2);
+  unlock->footer("Example:\n  " + std::string(kAppName) + " unlock general.checkViewFrame");
+  CLI::App* defaults = app.add_subcommand(
+      "default", "Set the default of a setting for everyone, without locking it (or --remove it)");
+  keyArgs(defaults, keyHelp + ", then the value (not with --remove): " + valueHelp, 1, 3);
+  defaults->add_flag("--remove", r.remove, "Remove the administrator's default");
+  rangeOption(defaults);
+  defaults->footer("Examples:\n  " + std::string(kAppName) + " default general cmbPaperLengthUnit inch\n  " +
+                   kAppName + " default --remove DrwPaperLengthUnit");
+  CLI::App* locks = app.add_subcommand("locks", "List every lock and default of the administrator's file");
+  jsonFlag(locks);
+  CLI::App* list = app.add_subcommand("list", "List every setting: key, attribute, value, padlock");
+  jsonFlag(list);
+  CLI::App* sketcher = app.add_subcommand("sketcher", "Print the sketcher settings read from the same files");
   CLI::App* render = app.add_subcommand("render", "Draw pages as a self-contained HTML file");
   render->add_option("--html", r.html, "Output file, - for standard output")->required();
   render->add_option("pages", r.pages, "Pages to draw (default: all)");
   rangeOption(render);
+  CLI::App* completion = app.add_subcommand("completion", "Print a completion script for a shell");
+  std::string shell;
+  completion->add_option("shell", shell, "bash")->required()->check(CLI::IsMember({"bash"}));
+  app.footer("Exit codes: 0 done; 1 unexpected (or the output could not be written, or the catalogs are missing); "
+             "2 bad command line or unknown name; 3 refused (locked or disabled); 4 a value the control does not "
+             "take; 5 a settings file that cannot be read or written.");
 
   try {
     app.parse(argc, argv);
   } catch (const CLI::ParseError& e) {
+    // A mistyped command reads as unexpected arguments: name the command meant instead.
+    std::vector<std::string> commands;
+    for (const CLI::App* sub : app.get_subcommands([](CLI::App*) { return true; })) commands.push_back(sub->get_name());
+    for (int i = 1; i < argc; ++i) {
+      const std::string word = argv[i];
+      if (word == "--settings" || word == "--admin") {
+        ++i;
+        continue;
+      }
+      if (word.empty() || word[0] == '-') continue;
+      if (std::find(commands.begin(), commands.end(), word) != commands.end()) break;
+      err << "error: unknown command " << Quoted(word) << "." << DidYouMean(word, commands)
+          << " Run with --help for the commands.\n";
+      return kExitUsage;
+    }
     const int rc = app.exit(e, out, err);
     return rc == 0 ? kExitOk : kExitUsage;
   }
-  if (*pages) return ListPages(out);
+  if (*pages) return ListPages(r, out);
   if (*show) return Show(r, out, err);
-  if (*get) return Get(r, out, err);
-  if (*set) return Set(r, out, err);
-  if (*reset) return Reset(r, out, err);
-  if (*lock) return LockOrUnlock(r, true, out, err);
-  if (*unlock) return LockOrUnlock(r, false, out, err);
+  if (*list) return List(r, out, err);
+  if (*locks) return Locks(r, out, err);
   if (*render) return Render(r, out, err);
   if (*sketcher) return Sketcher(r, out, err);
+  if (*completion) return Completion(out);
+  if (*get) return TakeKey(r, 0, 0, err) ? kExitUsage : Get(r, out, err);
+  if (*set) return TakeKey(r, 1, 1, err) ? kExitUsage : Set(r, out, err);
+  if (*reset) {
+    if (r.args.empty()) return Reset(r, out, err);
+    return TakeKey(r, 0, 0, err) ? kExitUsage : Reset(r, out, err);
+  }
+  if (*lock) return TakeKey(r, 0, 1, err) ? kExitUsage : Administer(r, AdminAction::Lock, out, err);
+  if (*unlock) return TakeKey(r, 0, 0, err) ? kExitUsage : Administer(r, AdminAction::Unlock, out, err);
+  if (*defaults) {
+    if (int rc = TakeKey(r, r.remove ? 0 : 1, r.remove ? 0 : 1, err)) return rc;
+    return Administer(r, r.remove ? AdminAction::RemoveDefault : AdminAction::Default, out, err);
+  }
   return Overview(r, out, err);
 }
 
@@ -554,6 +847,10 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
   }
   CloseRepositories();
   out.flush();
+  if (!out) { // a script must not take a truncated answer for a complete one
+    err << "error: the output could not be written\n";
+    return rc == kExitOk ? kExitFailure : rc;
+  }
   return rc;
 }
 

@@ -139,7 +139,7 @@ bool ResolveKey(const std::vector<std::string>& iArgs, ZEPAppKey& oKey, std::siz
   std::vector<std::string> candidates = SingleKeys();
   for (const std::string& p : PageNames()) candidates.push_back(p);
   oError = "unknown setting \"" + first + "\": name it PAGE CONTROL, PAGE.CONTROL or by its stored attribute." +
-           DidYouMean(first, candidates);
+           DidYouMean(first, candidates) + " 'drafting-options list' shows every setting.";
   return false;
 }
 
