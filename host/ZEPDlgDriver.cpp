@@ -118,6 +118,20 @@ bool ZEPDlgDriver::Select(ZEPDialog* iWidget, int iIndex) {
   return true;
 }
 
+bool ZEPDlgDriver::DropDown(ZEPDialog* iWidget) {
+  ZEPDlgCombo* combo = iWidget && iWidget->IsEffectivelyEnabled() ? PickableCombo(iWidget) : nullptr;
+  if (!combo || !combo->IsEffectivelyEnabled()) return false;
+  combo->SendNotification(combo->GetComboDropNotification());
+  return true;
+}
+
+bool ZEPDlgDriver::CloseUp(ZEPDialog* iWidget) {
+  ZEPDlgCombo* combo = iWidget && iWidget->IsEffectivelyEnabled() ? PickableCombo(iWidget) : nullptr;
+  if (!combo || !combo->IsEffectivelyEnabled()) return false;
+  combo->SendNotification(combo->GetComboCloseUpNotification());
+  return true;
+}
+
 bool ZEPDlgDriver::SelectColor(ZEPDialog* iWidget, unsigned int iRed, unsigned int iGreen, unsigned int iBlue) {
   if (!iWidget || !iWidget->IsEffectivelyEnabled()) return false;
   auto* colour = ZEPSysDynamicCast<ZEPComboColor>(iWidget);

@@ -10,3 +10,5 @@
 #include "ZEPScalesServices.h"
 #include "ZEPStdServices.h"
 #include "ZEPSketcherSettings.h"
+#include "ZEPPLMServices.h"
+#include "ZEPDfuScaleToolbox.h"
