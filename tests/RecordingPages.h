@@ -6,6 +6,7 @@
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
+#include "ZEP2DBaseOptMainFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
 class RecordingGridPage : public Recording<ZEP2DBaseOptGridFrm> {
@@ -56,6 +57,21 @@ protected:
   ZEP2DBaseOptGridFrm* CreateGridFrame() override {
     return _script.Option("CreateGridFrame", 1) ? new RecordingGridPage(_script, this) : nullptr;
   }
+};
+
+// The main page answers its icon and default standard from the script's "GetFrameIconName"
+// and "GetDefaultStandardName" answers.
+class RecordingMainPage : public Recording<ZEP2DBaseOptMainFrm> {
+public:
+  RecordingMainPage(HookScript& iScript, ZEPDialog* iParent)
+      : Recording<ZEP2DBaseOptMainFrm>(iScript, iParent, "MainPage") {}
+
+protected:
+  ZEPString GetFrameIconName() override { return _script.Answer("GetFrameIconName"); }
+  ZEPUnicodeString GetDefaultStandardName() override { return _script.Answer("GetDefaultStandardName"); }
+#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptMainFrm, Name, Kind)
+#include "ZEP2DBaseOptMainFrm.def"
+#undef ZEP_SETTING
 };
 
 // A page built and initialised on iParent, as the host does it.

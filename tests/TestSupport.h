@@ -40,6 +40,8 @@ protected:
     ZEPCkeUnitsSetup::Reset();
     ZEPScalesSetup::Reset();
     ZEPStdSetup::Reset();
+    ZEPPLMSetup::Reset();
+    ZEPScaleToolboxSetup::Reset();
   }
   // A top-level window that owns what a test builds on it.
   ZEPDlgWindow _root{nullptr, "root", 0};
