@@ -2,6 +2,7 @@
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
+#include "ZEP2DBaseOptMainFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
 #include <benchmark/benchmark.h>
@@ -38,6 +39,13 @@ struct GeoPage : ZEP2DBaseOptGeoFrm {
   ZEP2DBaseOptGridFrm* CreateGridFrame() override { return new GridPage(this); }
 #include "ZEP2DBaseOptGeoFrm.def"
 };
+struct MainPage : ZEP2DBaseOptMainFrm {
+  explicit MainPage(ZEPDialog* iParent) : ZEP2DBaseOptMainFrm(iParent, "MainPage") {}
+  long _writes = 0;
+  ZEPString GetFrameIconName() override { return "I_MainOptions"; }
+  ZEPUnicodeString GetDefaultStandardName() override { return "ISO"; }
+#include "ZEP2DBaseOptMainFrm.def"
+};
 #undef ZEP_SETTING
 
 template <class Page> void BuildAndInitialize(benchmark::State& state) {
@@ -66,6 +74,7 @@ BENCHMARK_TEMPLATE(BuildAndInitialize, GridPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, GalPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, PrimaryViewPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, GeoPage);
+BENCHMARK_TEMPLATE(BuildAndInitialize, MainPage);
 
 // A sub-dialog as the user goes through it: press its button, tick a check, close it.
 void GeoSubDialogRoundTrip(benchmark::State& state) {
@@ -90,3 +99,21 @@ void PrimaryViewClickResize(benchmark::State& state) { ClickToHook<PrimaryViewPa
 BENCHMARK(GridClickSnap);
 BENCHMARK(GalClickViewFrame);
 BENCHMARK(PrimaryViewClickResize);
+
+// The standard combo as the user goes through it: open the list, pick a standard, close it.
+void MainChooseStandard(benchmark::State& state) {
+  ZEPDlgWindow root(nullptr, "root", 0);
+  auto* page = new MainPage(&root);
+  page->Build();
+  page->Initialize();
+  ZEPDialog* combo = ZEPDlgDriver::FindControl(page, "cmbStandardName");
+  int line = 0;
+  for (auto _ : state) {
+    ZEPDlgDriver::DropDown(combo);
+    ZEPDlgDriver::Select(combo, line);
+    ZEPDlgDriver::CloseUp(combo);
+    line = 1 - line;
+  }
+  if (page->_writes == 0) state.SkipWithError("no standard was written");
+}
+BENCHMARK(MainChooseStandard);

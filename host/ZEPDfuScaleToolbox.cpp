@@ -19,8 +19,10 @@ std::map<std::pair<int, int>, double>& Overrides() {
 
 std::string Trim(const std::string& iText) {
   size_t b = 0, e = iText.size();
-  while (b < e && std::isspace(static_cast<unsigned char>(iText[b]))) ++b;
-  while (e > b && std::isspace(static_cast<unsigned char>(iText[e - 1]))) --e;
+  while (b < e && std::isspace(static_cast<unsigned char>(iText[b])))
+    ++b;
+  while (e > b && std::isspace(static_cast<unsigned char>(iText[e - 1])))
+    --e;
   return iText.substr(b, e - b);
 }
 
@@ -29,7 +31,8 @@ bool ReadNumber(const std::string& iText, double& oValue) {
   std::string t = Trim(iText);
   if (t.empty()) return false;
   for (char c : t)
-    if (!std::isdigit(static_cast<unsigned char>(c)) && c != '.' && c != 'e' && c != 'E' && c != '-' && c != '+')
+    if (!std::isdigit(static_cast<unsigned char>(c)) && c != '.' && c != 'e' && c != 'E' &&
+        c != '-' && c != '+')
       return false;
   if (!std::isdigit(static_cast<unsigned char>(t[0])) && t[0] != '.') return false;
   errno = 0;
@@ -47,8 +50,8 @@ std::string Format(double iValue) {
 }
 } // namespace
 
-long ZEPDfuScaleAndUnitsToolbox::DecimalToFractionConvertor(double iValue, double& oNumerator, double& oDenominator,
-                                                            int iPrecision) {
+long ZEPDfuScaleAndUnitsToolbox::DecimalToFractionConvertor(double iValue, double& oNumerator,
+                                                            double& oDenominator, int iPrecision) {
   if (!std::isfinite(iValue)) return E_FAIL;
   if (iValue == 0.0) {
     oNumerator = 0.0;
@@ -77,7 +80,8 @@ long ZEPDfuScaleAndUnitsToolbox::DecimalToFractionConvertor(double iValue, doubl
   return S_OK;
 }
 
-long ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(const ZEPUnicodeString& iText, ZEPUnicodeString& oText,
+long ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(const ZEPUnicodeString& iText,
+                                                                ZEPUnicodeString& oText,
                                                                 double& oValue, int& oForm) {
   const std::string text = iText.str();
   const size_t colon = text.find(':');

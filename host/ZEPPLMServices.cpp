@@ -48,7 +48,8 @@ ZEPRefCounted* ZEPRefCounted::GetInterface(const ZEPMetaObject* iInterface) {
 }
 
 // ---- knowledge types ----------------------------------------------------------------------------
-long ZEPCkeTypeProtectedServices::RetrieveKnowledgeType(const ZEPUnicodeString& iName, ZEPIType_var& oType) {
+long ZEPCkeTypeProtectedServices::RetrieveKnowledgeType(const ZEPUnicodeString& iName,
+                                                        ZEPIType_var& oType) {
   if (iName != ZEPUnicodeString("DIFStandardRep")) {
     oType = ZEPIType_var();
     return E_FAIL;
@@ -64,12 +65,15 @@ ZEPRefCounted* ZEPPLMStandardObject::GetInterface(const ZEPMetaObject* iInterfac
   return ZEPRefCounted::GetInterface(iInterface);
 }
 
-ZEPIPLMComponent::ZEPIPLMComponent(ZEPPLMStandardObject* iObject) : _pObject(iObject) { _pObject->AddRef(); }
+ZEPIPLMComponent::ZEPIPLMComponent(ZEPPLMStandardObject* iObject) : _pObject(iObject) {
+  _pObject->AddRef();
+}
 ZEPIPLMComponent::~ZEPIPLMComponent() { _pObject->Release(); }
 
 ZEPRefCounted* ZEPIPLMComponent::GetInterface(const ZEPMetaObject* iInterface) {
   if (iInterface == ZEPIAlias::MetaObject())
-    return _pObject->Data().withAlias ? new ZEPIAlias(ZEPUnicodeString(_pObject->Data().name)) : nullptr;
+    return _pObject->Data().withAlias ? new ZEPIAlias(ZEPUnicodeString(_pObject->Data().name))
+                                      : nullptr;
   return ZEPRefCounted::GetInterface(iInterface);
 }
 
@@ -78,10 +82,13 @@ long ZEPIPLMComponent::GetPLMID(ZEPPLMIdentificator*& oID) {
   return S_OK;
 }
 
-ZEPPLMIdentificator::ZEPPLMIdentificator(ZEPPLMStandardObject* iObject) : _pObject(iObject) { _pObject->AddRef(); }
+ZEPPLMIdentificator::ZEPPLMIdentificator(ZEPPLMStandardObject* iObject) : _pObject(iObject) {
+  _pObject->AddRef();
+}
 ZEPPLMIdentificator::~ZEPPLMIdentificator() { _pObject->Release(); }
 
-long ZEPAdpComponentQuery::GetUniqueKey(ZEPPLMIdentificator* iID, ZEPAdpUniqueKey& oKey, ZEPUnicodeString* oMessage) {
+long ZEPAdpComponentQuery::GetUniqueKey(ZEPPLMIdentificator* iID, ZEPAdpUniqueKey& oKey,
+                                        ZEPUnicodeString* oMessage) {
   if (!iID || iID->_pObject->Data().keyQueryFails) {
     if (oMessage) *oMessage = "The repository did not answer for the component's key.";
     return E_FAIL;
@@ -111,7 +118,8 @@ long ZEPIPLMChooser::SetTypes(const ZEPListValZEPIType_var& iTypes) {
   return S_OK;
 }
 
-long ZEPIPLMChooser::SetNavigationOpenParameters(const ZEPPLMNavigationOpenParameters& iParameters, int iFlag) {
+long ZEPIPLMChooser::SetNavigationOpenParameters(const ZEPPLMNavigationOpenParameters& iParameters,
+                                                 int iFlag) {
   _mode = iParameters.GetModeValue();
   _openFlag = iFlag;
   return S_OK;
@@ -146,7 +154,8 @@ void ZEPIPLMChooser::SetChosen(std::vector<ZEPRefCounted*> iObjects) {
   _chosen = std::move(iObjects);
 }
 
-long ZEPIPLMChooserFactory::CreatePLMChooser(ZEPDialog* iParent, const ZEPString& iName, ZEPIPLMChooser*& oChooser) {
+long ZEPIPLMChooserFactory::CreatePLMChooser(ZEPDialog* iParent, const ZEPString& iName,
+                                             ZEPIPLMChooser*& oChooser) {
   oChooser = nullptr;
   if (State().creationFails) return E_FAIL;
   oChooser = new ZEPIPLMChooser(iParent, iName, State().withCommand);

@@ -106,7 +106,8 @@ private:
 class ZEPAdpUniqueKey {
 public:
   ZEPAdpUniqueKey() = default;
-  ZEPAdpUniqueKey(ZEPUnicodeString iKey, int iUnicity) : _key(std::move(iKey)), _unicity(iUnicity) {}
+  ZEPAdpUniqueKey(ZEPUnicodeString iKey, int iUnicity)
+      : _key(std::move(iKey)), _unicity(iUnicity) {}
   // Negative when the key does not identify its component for sure.
   int UnicityGuarantee() const { return _unicity; }
   ZEPUnicodeString AsString() const { return _key; }
@@ -122,7 +123,8 @@ public:
   explicit ZEPAdpComponentQuery(void* iErrorMonitor = nullptr) { (void)iErrorMonitor; }
   // S_OK and the key of the identified component; E_FAIL for a null identificator or when the
   // repository does not answer. oMessage, when given, receives the failure's text.
-  long GetUniqueKey(ZEPPLMIdentificator* iID, ZEPAdpUniqueKey& oKey, ZEPUnicodeString* oMessage = nullptr);
+  long GetUniqueKey(ZEPPLMIdentificator* iID, ZEPAdpUniqueKey& oKey,
+                    ZEPUnicodeString* oMessage = nullptr);
 };
 
 // ---- the chooser ------------------------------------------------------------------------------

@@ -73,7 +73,8 @@ public:
     calls.push_back({iHook, {double(iRed), double(iGreen), double(iBlue)}, {}});
     Store(calls.back());
   }
-  static std::string Attribute(const std::string& iSetter) { return iSetter.substr(6); } // after "SetSys"
+  // The attribute of a setter: its name after "SetSys".
+  static std::string Attribute(const std::string& iSetter) { return iSetter.substr(6); }
   void Store(const HookCall& iCall) {
     if (storeWrites) values[Attribute(iCall.hook)] = iCall.values;
   }

@@ -68,7 +68,9 @@ public:
 
 protected:
   ZEPString GetFrameIconName() override { return _script.Answer("GetFrameIconName"); }
-  ZEPUnicodeString GetDefaultStandardName() override { return _script.Answer("GetDefaultStandardName"); }
+  ZEPUnicodeString GetDefaultStandardName() override {
+    return _script.Answer("GetDefaultStandardName");
+  }
 #define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptMainFrm, Name, Kind)
 #include "ZEP2DBaseOptMainFrm.def"
 #undef ZEP_SETTING

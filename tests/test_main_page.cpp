@@ -22,7 +22,9 @@ protected:
     _script.textLists = {{"StandardPLMList", {"Company A", "Company B"}},
                          {"StandardPLMIDList", {"key-a", "key-b"}}};
     _script.texts = {{"StandardName", "key-a"}};
-    _script.values = {{"IsStandardPLM", {1}}, {"InsertDrawing", {1}}, {"ScaleRatio", {0.5, 100, 10000, 0.01, 0.0001}}};
+    _script.values = {{"IsStandardPLM", {1}},
+                      {"InsertDrawing", {1}},
+                      {"ScaleRatio", {0.5, 100, 10000, 0.01, 0.0001}}};
   }
   int Open() {
     _pPage = new RecordingMainPage(_script, &_root);
@@ -32,7 +34,9 @@ protected:
   }
   ZEPDialog* Control(const char* iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
   ZEPDlgCombo* StdCombo() { return ZEPSysDynamicCast<ZEPDlgCombo>(Control("cmbStandardName")); }
-  ZEPDlgEditor* Editor(const char* iName) { return ZEPSysDynamicCast<ZEPDlgEditor>(Control(iName)); }
+  ZEPDlgEditor* Editor(const char* iName) {
+    return ZEPSysDynamicCast<ZEPDlgEditor>(Control(iName));
+  }
   Strings Lines() {
     Strings out;
     for (int i = 0; i < StdCombo()->GetLineCount(); ++i) {
@@ -58,7 +62,8 @@ protected:
   std::string Written(const char* iHook) {
     auto calls = _script.Calls(iHook);
     if (calls.empty()) return "(not written)";
-    return calls.back().values.empty() ? calls.back().text : std::to_string(int(calls.back().values[0]));
+    return calls.back().values.empty() ? calls.back().text
+                                       : std::to_string(int(calls.back().values[0]));
   }
   HookScript _script;
   RecordingMainPage* _pPage = nullptr;
@@ -97,7 +102,8 @@ TEST_F(MainPage, EachOptionalPartExistsExactlyWhenItsInfoHookDoesNotFail) {
       _pPage = new RecordingMainPage(_script, window);
       const int rows = _pPage->Build();
       const bool present = status >= 0;
-      EXPECT_EQ(ZEPDlgDriver::Find(_pPage, part.widget) != nullptr, present) << part.attribute << " " << status;
+      EXPECT_EQ(ZEPDlgDriver::Find(_pPage, part.widget) != nullptr, present)
+          << part.attribute << " " << status;
       EXPECT_EQ(rows, present ? part.rows : 1) << part.attribute << " " << status;
       delete window;
     }
@@ -211,9 +217,10 @@ TEST_F(MainPage, ValidatedChoiceAddsTheNewStandardsAndMakesTheFirstCurrent) {
   EXPECT_EQ(chooser->GetModes(), (std::vector<int>{0, 1}));
   EXPECT_EQ(chooser->GetCommand()->GetFather(), _pPage);
 
-  ASSERT_TRUE(ZEPPLMSetup::Validate({{"Ünïcode std", "key-c"}, {"Company D", "key-d"}, {"Renamed A", "key-a"}}));
-  EXPECT_EQ(Hooks(), (Strings{"SetSysStandardPLMList", "SetSysStandardPLMIDList", "SetSysStandardName",
-                              "SetSysIsStandardPLM"}));
+  ASSERT_TRUE(ZEPPLMSetup::Validate(
+      {{"Ünïcode std", "key-c"}, {"Company D", "key-d"}, {"Renamed A", "key-a"}}));
+  EXPECT_EQ(Hooks(), (Strings{"SetSysStandardPLMList", "SetSysStandardPLMIDList",
+                              "SetSysStandardName", "SetSysIsStandardPLM"}));
   EXPECT_EQ(Written("SetSysStandardPLMList"), "Company A\nCompany B\nÜnïcode std\nCompany D\n");
   EXPECT_EQ(Written("SetSysStandardPLMIDList"), "key-a\nkey-b\nkey-c\nkey-d\n");
   EXPECT_EQ(Written("SetSysStandardName"), "key-c");
@@ -356,9 +363,9 @@ TEST_F(MainPage, RatioEntriesAreStoredForTheShownRangeWithinItsTolerances) {
     const char* typed;
     const char* shown;
     double stored; // 0: refused
-  } entries[] = {{"1:50", "1:50", 0.02},   {"1/4", "1:4", 0.25},      {"2", "2:1", 2.0},
-                 {"0.75", "3:4", 0.75},    {"abc", "3:4", 0},         {"1:0", "3:4", 0},
-                 {"1:100000", "3:4", 0},   {"1:1000", "1:1000", 0.001}, {"1000", "1000:1", 1000.0},
+  } entries[] = {{"1:50", "1:50", 0.02}, {"1/4", "1:4", 0.25},        {"2", "2:1", 2.0},
+                 {"0.75", "3:4", 0.75},  {"abc", "3:4", 0},           {"1:0", "3:4", 0},
+                 {"1:100000", "3:4", 0}, {"1:1000", "1:1000", 0.001}, {"1000", "1000:1", 1000.0},
                  {"1001", "1000:1", 0}};
   for (const auto& e : entries) {
     _script.calls.clear();
@@ -369,7 +376,8 @@ TEST_F(MainPage, RatioEntriesAreStoredForTheShownRangeWithinItsTolerances) {
       continue;
     }
     ASSERT_EQ(Hooks(), Strings{"SetSysScaleRatio"}) << e.typed;
-    EXPECT_EQ(_script.calls[0].values, (std::vector<double>{e.stored, 100, 10000, 0.01, 0.0001})) << e.typed;
+    EXPECT_EQ(_script.calls[0].values, (std::vector<double>{e.stored, 100, 10000, 0.01, 0.0001}))
+        << e.typed;
   }
   // Another range shows its own ratio and bounds, and writes nothing.
   _script.calls.clear();
@@ -427,7 +435,8 @@ TEST_F(MainPage, ShareableFollowsInsertDrawingButItsLockWins) {
   EXPECT_FALSE(Control("chkMakeDrawingShareable")->IsEffectivelyEnabled());
   ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkInsertDrawing")));
   ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkMakeDrawingShareable")));
-  EXPECT_EQ(Hooks(), (Strings{"SetSysInsertDrawing", "SetSysInsertDrawing", "SetSysMakeDrawingShareable"}));
+  EXPECT_EQ(Hooks(),
+            (Strings{"SetSysInsertDrawing", "SetSysInsertDrawing", "SetSysMakeDrawingShareable"}));
   EXPECT_EQ(Written("SetSysMakeDrawingShareable"), "1");
 }
 
@@ -441,16 +450,19 @@ TEST_F(MainPage, EachLockStopsItsOwnControlsOnly) {
                {"InsertDrawing", {"chkInsertDrawing"}},
                {"MakeDrawingShareable", {"chkMakeDrawingShareable"}},
                {"ScaleRatio", {"edtScaleRatio", "cmbRatioRange"}}};
-  const Strings all = {"cmbStandardName", "pusStandardPLMAdd", "pusStandardPLMRemove", "chkInsertDrawing",
-                       "chkMakeDrawingShareable", "edtScaleRatio", "cmbRatioRange"};
+  const Strings all = {"cmbStandardName",  "pusStandardPLMAdd",       "pusStandardPLMRemove",
+                       "chkInsertDrawing", "chkMakeDrawingShareable", "edtScaleRatio",
+                       "cmbRatioRange"};
   for (const auto& lock : locks) {
     auto* window = new ZEPDlgWindow(&_root, "window", 0);
     ScriptEveryPart();
     _script.locked = {lock.attribute};
     _pPage = OpenPage<RecordingMainPage>(_script, window);
     for (const std::string& name : all) {
-      const bool stopped = std::find(lock.stopped.begin(), lock.stopped.end(), name) != lock.stopped.end();
-      EXPECT_EQ(Control(name.c_str())->IsEffectivelyEnabled(), !stopped) << lock.attribute << " " << name;
+      const bool stopped =
+          std::find(lock.stopped.begin(), lock.stopped.end(), name) != lock.stopped.end();
+      EXPECT_EQ(Control(name.c_str())->IsEffectivelyEnabled(), !stopped)
+          << lock.attribute << " " << name;
     }
     delete window;
   }

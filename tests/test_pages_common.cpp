@@ -147,7 +147,8 @@ TEST_P(EveryPage, ModuleHooksAcceptEveryChangeWithoutFailing) {
   for (ZEPDialog* w : all)
     operated += Operate(w) ? 1 : 0;
   EXPECT_GE(operated, 1);
-  EXPECT_EQ(script.calls.size(), static_cast<size_t>(operated - GetParam().silent + GetParam().extraWrites))
+  EXPECT_EQ(script.calls.size(),
+            static_cast<size_t>(operated - GetParam().silent + GetParam().extraWrites))
       << "every operated control writes once, but for push buttons, a radio already on and the "
          "range combo";
   EXPECT_EQ(ZEPCheckLog::Count(), 0);

@@ -86,10 +86,12 @@ int ZEP2DBaseOptMainFrm::Build() {
   _cmbStandardName->SetGridConstraints(0, 1, 1, 1, 0x1E);
   _cmbStandardName->SetVisibleTextWidth(15);
   if (ZEPDlgCombo* pCmb = _cmbStandardName->GetCombo()) {
-    AddAnalyseNotificationCB(pCmb, pCmb->GetComboSelectNotification(), &ZEP2DBaseOptMainFrm::Write, nullptr);
-    AddAnalyseNotificationCB(pCmb, pCmb->GetComboDropNotification(), &ZEP2DBaseOptMainFrm::ComboNotif, nullptr);
-    AddAnalyseNotificationCB(pCmb, pCmb->GetComboCloseUpNotification(), &ZEP2DBaseOptMainFrm::ComboNotif,
+    AddAnalyseNotificationCB(pCmb, pCmb->GetComboSelectNotification(), &ZEP2DBaseOptMainFrm::Write,
                              nullptr);
+    AddAnalyseNotificationCB(pCmb, pCmb->GetComboDropNotification(),
+                             &ZEP2DBaseOptMainFrm::ComboNotif, nullptr);
+    AddAnalyseNotificationCB(pCmb, pCmb->GetComboCloseUpNotification(),
+                             &ZEP2DBaseOptMainFrm::ComboNotif, nullptr);
   }
   auto pushButton = [this, frmStd, &info](const char* iName, short iColumn, const char* iIcon) {
     auto* push = new ZEPDrwLockPushButton(frmStd, iName, info);
@@ -99,14 +101,16 @@ int ZEP2DBaseOptMainFrm::Build() {
                              &ZEP2DBaseOptMainFrm::NotifPush, nullptr);
     return push;
   };
-  if (GetSysStandardPLMAddInfo(info) >= 0) _pPushStandardPLMAdd = pushButton("pusStandardPLMAdd", 2, "I_D3M_Add");
+  if (GetSysStandardPLMAddInfo(info) >= 0)
+    _pPushStandardPLMAdd = pushButton("pusStandardPLMAdd", 2, "I_D3M_Add");
   if (GetSysStandardPLMRemoveInfo(info) >= 0)
     _pPushStandardPLMRemove = pushButton("pusStandardPLMRemove", 3, "I_D3M_Remove");
 
   if (GetSysInsertDrawingInfo(info) >= 0) {
     _pChkInsertDrawing = new ZEPDrwLockCheckButton(_pMainFrame, "chkInsertDrawing", info, 0);
     _pChkInsertDrawing->SetGridConstraints(static_cast<short>(rows++), 0, 1, 1, 0x1E);
-    AddAnalyseNotificationCB(_pChkInsertDrawing->GetDialog(), _pChkInsertDrawing->GetChkBModifyNotification(),
+    AddAnalyseNotificationCB(_pChkInsertDrawing->GetDialog(),
+                             _pChkInsertDrawing->GetChkBModifyNotification(),
                              &ZEP2DBaseOptMainFrm::Write, nullptr);
   }
 
@@ -114,11 +118,12 @@ int ZEP2DBaseOptMainFrm::Build() {
     auto* frame = new ZEPDlgFrame(_pMainFrame, "frmMakeDrawingShareable", 0x80001);
     frame->SetGridConstraints(static_cast<short>(rows++), 0, 1, 1, 0x1E);
     (new ZEPDrwLockLabel(frame, "lblInv", 0))->SetGridConstraints(0, 0, 1, 1, 0x1E);
-    _pChkMakeDrawingShareable = new ZEPDrwLockCheckButton(frame, "chkMakeDrawingShareable", info, 0);
+    _pChkMakeDrawingShareable =
+        new ZEPDrwLockCheckButton(frame, "chkMakeDrawingShareable", info, 0);
     _pChkMakeDrawingShareable->SetGridConstraints(0, 1, 1, 1, 0x1E);
     AddAnalyseNotificationCB(_pChkMakeDrawingShareable->GetDialog(),
-                             _pChkMakeDrawingShareable->GetChkBModifyNotification(), &ZEP2DBaseOptMainFrm::Write,
-                             nullptr);
+                             _pChkMakeDrawingShareable->GetChkBModifyNotification(),
+                             &ZEP2DBaseOptMainFrm::Write, nullptr);
   }
 
   if (GetSysScaleRatioInfo(info) >= 0) {
@@ -183,13 +188,15 @@ void ZEP2DBaseOptMainFrm::UpdateWidgets() {
 }
 
 void ZEP2DBaseOptMainFrm::UpdateShareableSensitivity() {
-  if (_pChkMakeDrawingShareable) _pChkMakeDrawingShareable->SetSensitivity(Sensitivity(_bInsertDrawing != 0));
+  if (_pChkMakeDrawingShareable)
+    _pChkMakeDrawingShareable->SetSensitivity(Sensitivity(_bInsertDrawing != 0));
 }
 
 // Folder lines first, then one line per PLM standard; the current standard is selected, or
 // shown as an extra line 0 when it is in neither list.
 void ZEP2DBaseOptMainFrm::UpdateComboStd(bool iDropping) {
-  if (!_cmbStandardName) return Check_Pointer_Failed__("_cmbStandardName", kPath, __LINE__, nullptr);
+  if (!_cmbStandardName)
+    return Check_Pointer_Failed__("_cmbStandardName", kPath, __LINE__, nullptr);
   ZEPDlgCombo* pCmb = _cmbStandardName->GetCombo();
   if (!pCmb) return Check_Pointer_Failed__("pCmb", kPath, __LINE__, nullptr);
 
@@ -211,29 +218,38 @@ void ZEP2DBaseOptMainFrm::UpdateComboStd(bool iDropping) {
   const int idxInDatabase = _lstStdPLMIDs.Locate(_standardName, 1);
   if (idxInFolder == 0 && idxInDatabase == 0) {
     if (!iDropping) {
-      const ZEPString icon = !_pPushStandardPLMAdd ? "" : (databaseStd ? kDatabaseIcon : kFolderIcon);
+      const ZEPString icon =
+          !_pPushStandardPLMAdd ? "" : (databaseStd ? kDatabaseIcon : kFolderIcon);
       const int first = 0;
-      if (icon.empty()) pCmb->SetLine(_standardName, first, 0x40u);
-      else pCmb->SetLine(_standardName, icon, first, 0x40u);
+      if (icon.empty())
+        pCmb->SetLine(_standardName, first, 0x40u);
+      else
+        pCmb->SetLine(_standardName, icon, first, 0x40u);
     } else {
       pCmb->ClearSelect();
     }
   } else {
     if (!((!databaseStd && 0 < idxInFolder) || (databaseStd && 0 < idxInDatabase)))
-      Check_TRUE_Failed__("(!databaseStd && 0<idxInFolder) || (databaseStd && 0<idxInDatabase)", kPath, __LINE__,
-                          nullptr);
-    if (!databaseStd && idxInFolder > 0) pCmb->SetSelect(idxInFolder - 1, 0);
-    else if (databaseStd && idxInDatabase > 0) pCmb->SetSelect(_lstStdFolder.Size() + idxInDatabase - 1, 0);
-    else _cmbStandardName->SetSelect(ZEPUnicodeString(), 0);
+      Check_TRUE_Failed__("(!databaseStd && 0<idxInFolder) || (databaseStd && 0<idxInDatabase)",
+                          kPath, __LINE__, nullptr);
+    if (!databaseStd && idxInFolder > 0)
+      pCmb->SetSelect(idxInFolder - 1, 0);
+    else if (databaseStd && idxInDatabase > 0)
+      pCmb->SetSelect(_lstStdFolder.Size() + idxInDatabase - 1, 0);
+    else
+      _cmbStandardName->SetSelect(ZEPUnicodeString(), 0);
   }
-  if (_pPushStandardPLMRemove) _pPushStandardPLMRemove->SetSensitivity(Sensitivity(idxInDatabase > 0));
+  if (_pPushStandardPLMRemove)
+    _pPushStandardPLMRemove->SetSensitivity(Sensitivity(idxInDatabase > 0));
 }
 
 void ZEP2DBaseOptMainFrm::UpdateScaleRatioEditors() {
   if (!_pEdtScaleRatio || !_pEdtScaleRatioDec) return;
   const double ratio = _dScaleRatio[Index()];
   double numerator = 1.0, denominator = 1.0;
-  if (FAILED(ZEPDfuScaleAndUnitsToolbox::DecimalToFractionConvertor(ratio, numerator, denominator, 6))) return;
+  if (FAILED(
+          ZEPDfuScaleAndUnitsToolbox::DecimalToFractionConvertor(ratio, numerator, denominator, 6)))
+    return;
   char text[64];
   std::snprintf(text, sizeof text, "%g:%g", numerator, denominator);
   _pEdtScaleRatio->SetText(ZEPUnicodeString(text), 0);
@@ -241,7 +257,8 @@ void ZEP2DBaseOptMainFrm::UpdateScaleRatioEditors() {
 }
 
 void ZEP2DBaseOptMainFrm::ComboNotif(ZEPCommand*, ZEPNotification* iNotif, void*) {
-  if (!_cmbStandardName) return Check_Pointer_Failed__("_cmbStandardName", kPath, __LINE__, nullptr);
+  if (!_cmbStandardName)
+    return Check_Pointer_Failed__("_cmbStandardName", kPath, __LINE__, nullptr);
   auto* pDropNotif = ZEPSysDynamicCast<ZEPDlgComboDropNotification>(iNotif);
   auto* pCloseUpNotif = ZEPSysDynamicCast<ZEPDlgComboCloseUpNotification>(iNotif);
   if (!pDropNotif && !pCloseUpNotif)
@@ -258,11 +275,13 @@ void ZEP2DBaseOptMainFrm::Write(ZEPCommand* iSender, ZEPNotification*, void*) {
     UpdateShareableSensitivity();
     return;
   }
-  if (Services::GetValueFromCheckButton(_pChkMakeDrawingShareable, iSender, _bMakeDrawingShareable) == S_OK) {
+  if (Services::GetValueFromCheckButton(_pChkMakeDrawingShareable, iSender,
+                                        _bMakeDrawingShareable) == S_OK) {
     SetSysMakeDrawingShareable(_bMakeDrawingShareable);
     return;
   }
-  if (_pEdtScaleRatio && ZEPSysDynamicCast<ZEPDlgEditor>(iSender) == _pEdtScaleRatio) return WriteScaleRatio();
+  if (_pEdtScaleRatio && ZEPSysDynamicCast<ZEPDlgEditor>(iSender) == _pEdtScaleRatio)
+    return WriteScaleRatio();
   if (_pCmbRatioRange && iSender == _pCmbRatioRange) {
     const int range = _pCmbRatioRange->GetSelect();
     if (range >= 1 && range <= kRangeCount) _currentRange = range;
@@ -289,8 +308,10 @@ void ZEP2DBaseOptMainFrm::WriteStandard() {
     // a line that is not where the lists put it.
     const int position = selected - (pCmb->GetLineCount() - _lstStdPLMNames.Size()) + 1;
     int idx = 0;
-    if (position >= 1 && position <= _lstStdPLMNames.Size() && _lstStdPLMNames[position] == text) idx = position;
-    else idx = _lstStdPLMNames.Locate(text, 1);
+    if (position >= 1 && position <= _lstStdPLMNames.Size() && _lstStdPLMNames[position] == text)
+      idx = position;
+    else
+      idx = _lstStdPLMNames.Locate(text, 1);
     if (!idx) return Check_TRUE_Failed__("idx", kPath, __LINE__, nullptr);
     if (!(0 < idx && idx <= _lstStdPLMIDs.Size()))
       return Check_TRUE_Failed__("0<idx&&idx<=_lstStdPLMIDs.Size()", kPath, __LINE__, nullptr);
@@ -310,13 +331,14 @@ void ZEP2DBaseOptMainFrm::WriteScaleRatio() {
   ZEPUnicodeString normal;
   double value = 1.0;
   int form = 0;
-  const long rc =
-      ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(_pEdtScaleRatio->GetText(), normal, value, form);
+  const long rc = ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(
+      _pEdtScaleRatio->GetText(), normal, value, form);
   const ZEPDibTolerances tolerances(ZEP2DBaseRangeCmb::GetMatchingRange(_currentRange));
   const double largest = tolerances.GetTolerance(7);
   const double smallest = tolerances.GetTolerance(6);
   // A tolerance that is not a positive number gives no bound at all: nothing is accepted.
-  const bool bounded = std::isfinite(largest) && std::isfinite(smallest) && largest > 0.0 && smallest > 0.0;
+  const bool bounded =
+      std::isfinite(largest) && std::isfinite(smallest) && largest > 0.0 && smallest > 0.0;
   if (SUCCEEDED(rc) && bounded && 1.0 / largest <= value && value <= 1.0 / smallest) {
     _dScaleRatio[Index()] = value;
     SetSysScaleRatio(_dScaleRatio, kRangeCount);
@@ -329,7 +351,8 @@ void ZEP2DBaseOptMainFrm::WriteScaleRatio() {
 void ZEP2DBaseOptMainFrm::NotifPush(ZEPCommand* iSender, ZEPNotification*, void*) {
   if (!iSender) return;
   if (_pPushStandardPLMAdd && iSender == _pPushStandardPLMAdd->GetDialog()) return OpenPLMChooser();
-  if (_pPushStandardPLMRemove && iSender == _pPushStandardPLMRemove->GetDialog()) return RemovePLMStandard();
+  if (_pPushStandardPLMRemove && iSender == _pPushStandardPLMRemove->GetDialog())
+    return RemovePLMStandard();
 }
 
 void ZEP2DBaseOptMainFrm::OpenPLMChooser() {
@@ -341,7 +364,8 @@ void ZEP2DBaseOptMainFrm::OpenPLMChooser() {
   if (!pChooserFactory) return Check_Pointer_Failed__("pChooserFactory", kPath, __LINE__, nullptr);
   pChooserFactory->CreatePLMChooser(this, "ZEPDbsSettingPLMStandardChooser", _pPLMObjectChooser);
   pChooserFactory->Release();
-  if (!_pPLMObjectChooser) return Check_Pointer_Failed__("_pPLMObjectChooser", kPath, __LINE__, nullptr);
+  if (!_pPLMObjectChooser)
+    return Check_Pointer_Failed__("_pPLMObjectChooser", kPath, __LINE__, nullptr);
 
   ZEPIType_var spType;
   ZEPCkeTypeProtectedServices::RetrieveKnowledgeType("DIFStandardRep", spType);
@@ -378,7 +402,8 @@ void ZEP2DBaseOptMainFrm::ReleasePLMChooser() {
 
 void ZEP2DBaseOptMainFrm::ClosePLMChooser(ZEPCommand*, ZEPNotification* iNotif, void*) {
   if (!iNotif) return Check_Pointer_Failed__("iNotif", kPath, __LINE__, nullptr);
-  if (!_pPLMObjectChooser) return Check_Pointer_Failed__("_pPLMObjectChooser", kPath, __LINE__, nullptr);
+  if (!_pPLMObjectChooser)
+    return Check_Pointer_Failed__("_pPLMObjectChooser", kPath, __LINE__, nullptr);
 
   ZEPNotification* pNotif = _pPLMObjectChooser->GetValidateNotification();
   if (iNotif->IsEqual(pNotif)) {
@@ -435,7 +460,8 @@ void ZEP2DBaseOptMainFrm::ClosePLMChooser(ZEPCommand*, ZEPNotification* iNotif, 
     }
   } else {
     pNotif = _pPLMObjectChooser->GetCancelNotification();
-    if (!iNotif->IsEqual(pNotif)) Check_TRUE_Failed__("iNotif->IsEqual(pNotif)", kPath, __LINE__, nullptr);
+    if (!iNotif->IsEqual(pNotif))
+      Check_TRUE_Failed__("iNotif->IsEqual(pNotif)", kPath, __LINE__, nullptr);
   }
   _pPLMObjectChooser->SetVisibility(ZEPDlgHide);
   ReleasePLMChooser();
