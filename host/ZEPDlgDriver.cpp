@@ -119,14 +119,16 @@ bool ZEPDlgDriver::Select(ZEPDialog* iWidget, int iIndex) {
 }
 
 bool ZEPDlgDriver::DropDown(ZEPDialog* iWidget) {
-  ZEPDlgCombo* combo = iWidget && iWidget->IsEffectivelyEnabled() ? PickableCombo(iWidget) : nullptr;
+  ZEPDlgCombo* combo =
+      iWidget && iWidget->IsEffectivelyEnabled() ? PickableCombo(iWidget) : nullptr;
   if (!combo || !combo->IsEffectivelyEnabled()) return false;
   combo->SendNotification(combo->GetComboDropNotification());
   return true;
 }
 
 bool ZEPDlgDriver::CloseUp(ZEPDialog* iWidget) {
-  ZEPDlgCombo* combo = iWidget && iWidget->IsEffectivelyEnabled() ? PickableCombo(iWidget) : nullptr;
+  ZEPDlgCombo* combo =
+      iWidget && iWidget->IsEffectivelyEnabled() ? PickableCombo(iWidget) : nullptr;
   if (!combo || !combo->IsEffectivelyEnabled()) return false;
   combo->SendNotification(combo->GetComboCloseUpNotification());
   return true;
