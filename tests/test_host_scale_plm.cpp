@@ -1,5 +1,5 @@
-// Host services of the main page: scale text and fractions, tolerances per range, the combo
-// list notifications and command fathers.
+// Host services of the main page: scale text and fractions, the combo list notifications and
+// command fathers.
 #include "TestSupport.h"
 
 #include <cmath>
@@ -61,20 +61,6 @@ TEST_F(HostScaleToolbox, DecimalsBecomeTheSimplestCloseFraction) {
     EXPECT_EQ(ZEPDfuScaleAndUnitsToolbox::DecimalToFractionConvertor(v, n, d, 6), E_FAIL) << v;
     EXPECT_EQ(n, 1.0);
   }
-}
-
-TEST_F(HostScaleToolbox, TolerancesFollowTheRangeAndCanBeSetPerRange) {
-  const double factor[] = {1.0, 100.0, 10000.0, 0.01, 0.0001};
-  for (int range = 1; range <= 5; ++range) {
-    ZEPDibTolerances t(static_cast<ZEPCkeScale>(range));
-    EXPECT_DOUBLE_EQ(1.0 / t.GetTolerance(7), 0.001 * factor[range - 1]);
-    EXPECT_DOUBLE_EQ(1.0 / t.GetTolerance(6), 1000.0 * factor[range - 1]);
-  }
-  ZEPScaleToolboxSetup::SetTolerance(ZEPCkeScaleSmall, 6, 0.5);
-  EXPECT_EQ(ZEPDibTolerances(ZEPCkeScaleSmall).GetTolerance(6), 0.5);
-  EXPECT_DOUBLE_EQ(ZEPDibTolerances(ZEPCkeScaleNormal).GetTolerance(6), 0.001);
-  ZEPScaleToolboxSetup::Reset();
-  EXPECT_DOUBLE_EQ(ZEPDibTolerances(ZEPCkeScaleSmall).GetTolerance(6), 0.1);
 }
 
 TEST_F(HostToolkitExtras, ListNotificationsAreTypedAndReachTheCombosSubscribers) {
