@@ -5,6 +5,7 @@
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
 #include "ZEP2DBaseOptManipFrm.h"
+#include "ZEP2DBaseOptMainFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
 #include <benchmark/benchmark.h>
@@ -63,6 +64,13 @@ struct AdminPage : ZEP2DBaseOptAdminFrm {
   ZEPSysPreferenceRepository* GetDlgPreferenceRepository() override { return nullptr; }
 #include "ZEP2DBaseOptAdminFrm.def"
 };
+struct MainPage : ZEP2DBaseOptMainFrm {
+  explicit MainPage(ZEPDialog* iParent) : ZEP2DBaseOptMainFrm(iParent, "MainPage") {}
+  long _writes = 0;
+  ZEPString GetFrameIconName() override { return "I_MainOptions"; }
+  ZEPUnicodeString GetDefaultStandardName() override { return "ISO"; }
+#include "ZEP2DBaseOptMainFrm.def"
+};
 #undef ZEP_SETTING
 
 // The drafting options the host keeps open: pages read the paper length unit there.
@@ -96,6 +104,7 @@ BENCHMARK_TEMPLATE(BuildAndInitialize, GalPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, PrimaryViewPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, GeoPage);
 BENCHMARK_TEMPLATE(BuildAndInitialize, DimPage);
+BENCHMARK_TEMPLATE(BuildAndInitialize, MainPage);
 
 // A sub-dialog as the user goes through it: press its button, tick a check, close it.
 void GeoSubDialogRoundTrip(benchmark::State& state) {
@@ -148,3 +157,20 @@ BENCHMARK(AllPagesBuildAndInitialize);
 
 void ManipClickMatrixCell(benchmark::State& state) { ClickToHook<ManipPage>(state, "_checkDimChangeSymbolMod"); }
 BENCHMARK(ManipClickMatrixCell);
+// The standard combo as the user goes through it: open the list, pick a standard, close it.
+void MainChooseStandard(benchmark::State& state) {
+  ZEPDlgWindow root(nullptr, "root", 0);
+  auto* page = new MainPage(&root);
+  page->Build();
+  page->Initialize();
+  ZEPDialog* combo = ZEPDlgDriver::FindControl(page, "cmbStandardName");
+  int line = 0;
+  for (auto _ : state) {
+    ZEPDlgDriver::DropDown(combo);
+    ZEPDlgDriver::Select(combo, line);
+    ZEPDlgDriver::CloseUp(combo);
+    line = 1 - line;
+  }
+  if (page->_writes == 0) state.SkipWithError("no standard was written");
+}
+BENCHMARK(MainChooseStandard);

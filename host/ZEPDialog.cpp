@@ -8,6 +8,8 @@
 #include <unordered_map>
 
 ZEP_IMPLEMENT_CLASS(ZEPNotification, ZEPBaseUnknown)
+ZEP_IMPLEMENT_CLASS(ZEPDlgComboDropNotification, ZEPNotification)
+ZEP_IMPLEMENT_CLASS(ZEPDlgComboCloseUpNotification, ZEPNotification)
 ZEP_IMPLEMENT_CLASS(ZEPCommand, ZEPBaseUnknown)
 ZEP_IMPLEMENT_CLASS(ZEPDialog, ZEPCommand)
 ZEP_IMPLEMENT_CLASS(ZEPDlgFrame, ZEPDialog)
@@ -60,6 +62,18 @@ ZEPCommand::~ZEPCommand() {
                               [this](const Subscription& x) { return x.subscriber == this; }),
                subs.end());
   }
+}
+
+ZEPCommand* ZEPCommand::GetFather() const {
+  return _pFather && IsAlive(_pFather, _fatherSerial) ? _pFather : nullptr;
+}
+
+void ZEPCommand::SetFather(ZEPCommand* iFather) {
+  // A father chain that comes back here would send notifications round for ever.
+  for (ZEPCommand* c = iFather; c; c = c->GetFather())
+    if (c == this) return;
+  _pFather = iFather;
+  _fatherSerial = iFather ? iFather->_serial : 0;
 }
 
 void ZEPCommand::AddCallback(ZEPCommand* iSender, ZEPNotification* iNotif, Callback iCallback, void* iData) {
@@ -326,6 +340,15 @@ int ZEPDlgCombo::GetLine(ZEPUnicodeString& oText, int iIndex) const {
     return -1;
   }
   oText = _lines[static_cast<size_t>(iIndex)].text;
+  return iIndex;
+}
+
+int ZEPDlgCombo::GetLineIconName(ZEPString& oIconName, int iIndex) const {
+  if (iIndex < 0 || iIndex >= GetLineCount()) {
+    oIconName.clear();
+    return -1;
+  }
+  oIconName = _lines[static_cast<size_t>(iIndex)].icon;
   return iIndex;
 }
 

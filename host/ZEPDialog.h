@@ -33,10 +33,24 @@ public:
   ZEPNotification(ZEPCommand* iOwner, std::string iKind) : _pOwner(iOwner), _kind(std::move(iKind)) {}
   ZEPCommand* GetOwner() const { return _pOwner; }
   const std::string& GetKind() const { return _kind; }
+  // 1 when iOther is this very notification object, else 0.
+  int IsEqual(const ZEPNotification* iOther) const { return iOther == this ? 1 : 0; }
 
 private:
   ZEPCommand* _pOwner;
   std::string _kind;
+};
+
+// A combo's list opens (drop) or closes (close-up).
+class ZEPDlgComboDropNotification : public ZEPNotification {
+  ZEP_DECLARE_CLASS
+public:
+  using ZEPNotification::ZEPNotification;
+};
+class ZEPDlgComboCloseUpNotification : public ZEPNotification {
+  ZEP_DECLARE_CLASS
+public:
+  using ZEPNotification::ZEPNotification;
 };
 
 class ZEPCommand : public ZEPBaseUnknown {
@@ -49,8 +63,11 @@ public:
   ZEPCommand(const ZEPCommand&) = delete;
   ZEPCommand& operator=(const ZEPCommand&) = delete;
 
-  // The command that receives the notifications this one does not analyse.
-  virtual ZEPCommand* GetFather() const { return nullptr; }
+  // The command that receives the notifications this one does not analyse: the one given to
+  // SetFather while it lives, else none.
+  virtual ZEPCommand* GetFather() const;
+  // A father that is destroyed first is forgotten, never reached.
+  void SetFather(ZEPCommand* iFather);
 
   // Sends iNotif from this command: the callbacks registered for it on this command run,
   // then those on each father in turn, each with the command it was registered on as sender.
@@ -62,6 +79,13 @@ public:
 
   // A notification object owned by this command, created on first use.
   ZEPNotification* OwnNotification(const char* iKind);
+  // The same, of a notification class of its own (for ZEPSysDynamicCast by the receiver).
+  template <class T> T* OwnTypedNotification(const char* iKind) {
+    for (auto& n : _notifications)
+      if (n->GetKind() == iKind) return ZEPSysDynamicCast<T>(n.get());
+    _notifications.push_back(std::make_unique<T>(this, iKind));
+    return static_cast<T*>(_notifications.back().get());
+  }
   // The notification objects created so far.
   std::vector<ZEPNotification*> GetNotifications() const;
 
@@ -92,6 +116,8 @@ private:
   void RunCallbacks(ZEPNotification* iNotif, ZEPCommand* iSender);
 
   std::uint64_t _serial;
+  ZEPCommand* _pFather = nullptr;
+  std::uint64_t _fatherSerial = 0;
   std::vector<Subscription> _subscriptions; // callbacks registered on this command
   std::vector<Sender> _senders;             // commands this one subscribed to
   std::vector<std::unique_ptr<ZEPNotification>> _notifications;
@@ -114,7 +140,11 @@ public:
   ZEPDialog(ZEPDialog* iParent, const ZEPString& iName, unsigned long iStyle);
   ~ZEPDialog() override;
 
-  ZEPCommand* GetFather() const override { return _pParent; }
+  // The father given to SetFather, else the parent widget.
+  ZEPCommand* GetFather() const override {
+    ZEPCommand* father = ZEPCommand::GetFather();
+    return father ? father : _pParent;
+  }
   ZEPDialog* GetParentDialog() const { return _pParent; }
   const std::vector<ZEPDialog*>& GetChildren() const { return _children; }
 
@@ -292,14 +322,21 @@ public:
   int GetSelect() const { return _selected; }
   // The text of line iIndex; empty and -1 when there is none.
   int GetLine(ZEPUnicodeString& oText, int iIndex) const;
+  // The icon name of line iIndex (empty for a line without icon); empty and -1 when there is
+  // no such line.
+  int GetLineIconName(ZEPString& oIconName, int iIndex) const;
   void ClearSelect() { _selected = -1; }
   void SetVisibleTextWidth(int iWidth) { _textWidth = iWidth; }
   void SetVisibleTextHeight(int iHeight) { _textHeight = iHeight; }
   int GetVisibleTextWidth() const { return _textWidth; }
   int GetVisibleTextHeight() const { return _textHeight; }
   ZEPNotification* GetComboSelectNotification() { return OwnNotification("ComboSelect"); }
-  ZEPNotification* GetComboDropNotification() { return OwnNotification("ComboDrop"); }
-  ZEPNotification* GetComboCloseUpNotification() { return OwnNotification("ComboCloseUp"); }
+  ZEPNotification* GetComboDropNotification() {
+    return OwnTypedNotification<ZEPDlgComboDropNotification>("ComboDrop");
+  }
+  ZEPNotification* GetComboCloseUpNotification() {
+    return OwnTypedNotification<ZEPDlgComboCloseUpNotification>("ComboCloseUp");
+  }
   const char* KindName() const override { return "combo"; }
   void DumpState(std::string& ioOut) const override;
 

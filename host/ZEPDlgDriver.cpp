@@ -118,6 +118,21 @@ bool ZEPDlgDriver::Select(ZEPDialog* iWidget, int iIndex) {
   return true;
 }
 
+namespace {
+// The user opens (iDrop) or closes the list of an operable combo.
+bool OpenOrCloseList(ZEPDialog* iWidget, bool iDrop) {
+  ZEPDlgCombo* combo =
+      iWidget && iWidget->IsEffectivelyEnabled() ? PickableCombo(iWidget) : nullptr;
+  if (!combo || !combo->IsEffectivelyEnabled()) return false;
+  combo->SendNotification(iDrop ? combo->GetComboDropNotification()
+                                : combo->GetComboCloseUpNotification());
+  return true;
+}
+} // namespace
+
+bool ZEPDlgDriver::DropDown(ZEPDialog* iWidget) { return OpenOrCloseList(iWidget, true); }
+bool ZEPDlgDriver::CloseUp(ZEPDialog* iWidget) { return OpenOrCloseList(iWidget, false); }
+
 bool ZEPDlgDriver::SelectColor(ZEPDialog* iWidget, unsigned int iRed, unsigned int iGreen, unsigned int iBlue) {
   if (!iWidget || !iWidget->IsEffectivelyEnabled()) return false;
   auto* colour = ZEPSysDynamicCast<ZEPComboColor>(iWidget);

@@ -24,6 +24,9 @@ public:
   static bool EnterText(ZEPDialog* iWidget, const ZEPUnicodeString& iText);
   // Combo line (0-based), entry of an application combo, or icon box entry.
   static bool Select(ZEPDialog* iWidget, int iIndex);
+  // Opens (drop-down) and closes (close-up) a combo's list; nothing is picked.
+  static bool DropDown(ZEPDialog* iWidget);
+  static bool CloseUp(ZEPDialog* iWidget);
   static bool SelectColor(ZEPDialog* iWidget, unsigned int iRed, unsigned int iGreen, unsigned int iBlue);
   // The close button of a window's frame (window close notification).
   static bool Close(ZEPDialog* iDialog);

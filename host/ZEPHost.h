@@ -11,3 +11,5 @@
 #include "ZEPStdServices.h"
 #include "ZEPSketcherSettings.h"
 #include "ZEPMessageBox.h"
+#include "ZEPPLMServices.h"
+#include "ZEPDfuScaleToolbox.h"

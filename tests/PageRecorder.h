@@ -22,6 +22,7 @@ public:
   // Getter values by attribute name; attributes not scripted use the module's bodies.
   std::map<std::string, std::vector<double>> values;
   std::map<std::string, std::string> texts;
+  std::map<std::string, std::vector<std::string>> textLists;
   // Info statuses by attribute; allInfo applies to every other attribute when set.
   std::map<std::string, long> info;
   bool allInfoSet = false;
@@ -30,6 +31,8 @@ public:
   // Answers of layout options and other page operations by name; unscripted ones keep the
   // module's answer.
   std::map<std::string, long> options;
+  // Text answers of page operations by name (icon names, a default standard); "" unscripted.
+  std::map<std::string, std::string> answers;
   std::vector<HookCall> calls;
   std::vector<std::string> reads; // getters called, in order
 
@@ -40,18 +43,40 @@ public:
     return out;
   }
 
-  template <class T> void Record(const char* iHook, const T& iValue) { calls.push_back({iHook, {double(iValue)}, {}}); }
-  void Record(const char* iHook, const ZEPUnicodeString& iValue) { calls.push_back({iHook, {}, iValue.str()}); }
+  // When set, the getters answer what the setters wrote last: a host that keeps its settings,
+  // for pages that read a setting back after writing it.
+  bool storeWrites = false;
+
+  template <class T> void Record(const char* iHook, const T& iValue) {
+    calls.push_back({iHook, {double(iValue)}, {}});
+    Store(calls.back());
+  }
+  void Record(const char* iHook, const ZEPUnicodeString& iValue) {
+    calls.push_back({iHook, {}, iValue.str()});
+    if (storeWrites) texts[Attribute(iHook)] = iValue.str();
+  }
   void Record(const char* iHook, const ZEPListValZEPUnicodeString& iValue) {
     HookCall c{iHook, {}, {}};
-    for (const ZEPUnicodeString& s : iValue.Items()) c.text += s.str() + "\n";
+    std::vector<std::string> items;
+    for (const ZEPUnicodeString& s : iValue.Items()) {
+      c.text += s.str() + "\n";
+      items.push_back(s.str());
+    }
     calls.push_back(c);
+    if (storeWrites) textLists[Attribute(iHook)] = items;
   }
   template <class T> void Record(const char* iHook, const T* iValues, int iCount) {
     calls.push_back({iHook, std::vector<double>(iValues, iValues + iCount), {}});
+    Store(calls.back());
   }
   template <class T> void Record(const char* iHook, const T& iRed, const T& iGreen, const T& iBlue) {
     calls.push_back({iHook, {double(iRed), double(iGreen), double(iBlue)}, {}});
+    Store(calls.back());
+  }
+  // The attribute of a setter: its name after "SetSys".
+  static std::string Attribute(const std::string& iSetter) { return iSetter.substr(6); }
+  void Store(const HookCall& iCall) {
+    if (storeWrites) values[Attribute(iCall.hook)] = iCall.values;
   }
 
   // True when the attribute is scripted and the outputs were filled.
@@ -69,9 +94,14 @@ public:
     oValue = it->second;
     return true;
   }
-  bool Fill(const char* iName, ZEPListValZEPUnicodeString&) {
+  bool Fill(const char* iName, ZEPListValZEPUnicodeString& oValue) {
     reads.push_back(iName);
-    return false;
+    auto it = textLists.find(iName);
+    if (it == textLists.end()) return false;
+    oValue.RemoveAll(1);
+    for (const std::string& s : it->second)
+      oValue.Append(ZEPUnicodeString(s));
+    return true;
   }
   template <class T> bool Fill(const char* iName, T* oValues, int iCount) {
     reads.push_back(iName);
@@ -94,6 +124,11 @@ public:
   long Option(const char* iName, long iModule) const {
     auto it = options.find(iName);
     return it == options.end() ? iModule : it->second;
+  }
+
+  std::string Answer(const char* iName) const {
+    auto it = answers.find(iName);
+    return it == answers.end() ? std::string() : it->second;
   }
 
   // True and the status when the attribute's info hook is scripted.

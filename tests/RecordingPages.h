@@ -9,6 +9,7 @@
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
 #include "ZEP2DBaseOptManipFrm.h"
+#include "ZEP2DBaseOptMainFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
 class RecordingGridPage : public Recording<ZEP2DBaseOptGridFrm> {
@@ -110,6 +111,23 @@ protected:
     const std::string name = it == _script.texts.end() ? "DraftingOptions" : it->second;
     return name.empty() ? nullptr : ZEPSysPreferenceRepository::GetPreferenceRepository(name.c_str());
   }
+};
+
+// The main page answers its icon and default standard from the script's "GetFrameIconName"
+// and "GetDefaultStandardName" answers.
+class RecordingMainPage : public Recording<ZEP2DBaseOptMainFrm> {
+public:
+  RecordingMainPage(HookScript& iScript, ZEPDialog* iParent)
+      : Recording<ZEP2DBaseOptMainFrm>(iScript, iParent, "MainPage") {}
+
+protected:
+  ZEPString GetFrameIconName() override { return _script.Answer("GetFrameIconName"); }
+  ZEPUnicodeString GetDefaultStandardName() override {
+    return _script.Answer("GetDefaultStandardName");
+  }
+#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptMainFrm, Name, Kind)
+#include "ZEP2DBaseOptMainFrm.def"
+#undef ZEP_SETTING
 };
 
 // A page built and initialised on iParent, as the host does it.

@@ -43,6 +43,8 @@ protected:
     ZEPMessageBoxSetup::Reset();
     // The administration page shows a section when this is set: not from the shell.
     unsetenv("ZEP_TDE_LA");
+    ZEPPLMSetup::Reset();
+    ZEPScaleToolboxSetup::Reset();
   }
   // A top-level window that owns what a test builds on it.
   ZEPDlgWindow _root{nullptr, "root", 0};

@@ -1,6 +1,7 @@
 // What every page shares: foreign senders are ignored, locks beat the page's rules.
 #include "RecordingPages.h"
 
+#include <algorithm>
 #include <functional>
 
 namespace {
@@ -11,6 +12,9 @@ struct PageCase {
   // User actions that write nothing with the module's hooks: push buttons, a radio already
   // on, the grid's scale range.
   int silent;
+  // Hooks written beyond one per operated control: choosing a standard on the main page writes
+  // its name and its flag.
+  int extraWrites = 0;
 };
 void PrintTo(const PageCase& iCase, std::ostream* oStream) { *oStream << iCase.name; }
 
@@ -38,6 +42,9 @@ const std::vector<std::string> kManipAttributes = {
 const std::vector<std::string> kAdminAttributes = {
 #include "ZEP2DBaseOptAdminFrm.def"
 };
+const std::vector<std::string> kMainAttributes = {
+#include "ZEP2DBaseOptMainFrm.def"
+};
 #undef ZEP_SETTING
 
 std::vector<PageCase> Pages() {
@@ -50,12 +57,16 @@ std::vector<PageCase> Pages() {
            kPrimaryViewAttributes, 0},
           {"Geometry", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingGeoPage>(s, p); },
            kGeoAttributes, 4},
+          {"Dimension", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingDimPage>(s, p); },
+           kDimAttributes, 1},
           {"Manipulators",
            [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingManipPage>(s, p); },
-           kManipAttributes, 0},
+           kManipAttributes, 0, 0},
           {"Administration",
            [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingAdminPage>(s, p); },
-           kAdminAttributes, 2}};
+           kAdminAttributes, 2, 0},
+          {"Main", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingMainPage>(s, p); },
+           kMainAttributes, 0, 1}};
 }
 
 void Collect(ZEPDialog* iWidget, std::vector<ZEPDialog*>& oAll) {
@@ -101,13 +112,20 @@ TEST_P(EveryPage, NotificationFromAWidgetThatIsNoControlChangesNothing) {
   const std::string before = ZEPDlgDriver::Dump(page);
   auto* stranger = new ZEPDlgPushButton(&_root, "pushStranger");
   int delivered = 0;
-  for (ZEPDialog* w : all)
-    for (ZEPNotification* n : w->GetNotifications()) {
+  for (ZEPDialog* w : all) {
+    // A combo's list opening and closing rebuilds its lines whoever says so, and writes
+    // nothing: the close-up comes last, so that the screen ends as it was.
+    std::vector<ZEPNotification*> notifs = w->GetNotifications();
+    std::stable_partition(notifs.begin(), notifs.end(), [](ZEPNotification* n) {
+      return !ZEPSysDynamicCast<ZEPDlgComboCloseUpNotification>(n);
+    });
+    for (ZEPNotification* n : notifs) {
       w->DeliverAs(n, stranger);
       w->DeliverAs(n, nullptr);
       w->DeliverAs(n, page);
       ++delivered;
     }
+  }
   EXPECT_GT(delivered, 0);
   EXPECT_TRUE(script.calls.empty());
   EXPECT_EQ(ZEPDlgDriver::Dump(page), before);
@@ -145,8 +163,9 @@ TEST_P(EveryPage, ModuleHooksAcceptEveryChangeWithoutFailing) {
   int operated = 0;
   for (ZEPDialog* w : all)
     operated += Operate(w) ? 1 : 0;
-  EXPECT_GE(operated, 2);
-  EXPECT_EQ(script.calls.size(), static_cast<size_t>(operated - GetParam().silent))
+  EXPECT_GE(operated, 1);
+  EXPECT_EQ(script.calls.size(),
+            static_cast<size_t>(operated - GetParam().silent + GetParam().extraWrites))
       << "every operated control writes once, but for push buttons, a radio already on and the "
          "range combo";
   EXPECT_EQ(ZEPCheckLog::Count(), 0);
