@@ -10,3 +10,4 @@
 #include "ZEPScalesServices.h"
 #include "ZEPStdServices.h"
 #include "ZEPSketcherSettings.h"
+#include "ZEPVidDialogs.h"

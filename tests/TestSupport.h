@@ -40,6 +40,7 @@ protected:
     ZEPCkeUnitsSetup::Reset();
     ZEPScalesSetup::Reset();
     ZEPStdSetup::Reset();
+    ZEPVidSetup::Reset();
   }
   // A top-level window that owns what a test builds on it.
   ZEPDlgWindow _root{nullptr, "root", 0};
