@@ -60,21 +60,20 @@ public:
 ZEPBaseUnknown_WR::ZEPBaseUnknown_WR(ZEPBaseUnknown* iObject) {
   if (auto* command = dynamic_cast<ZEPCommand*>(iObject)) {
     _pObject = iObject;
+    _pCommand = command;
     _serial = command->GetSerial();
-    _command = true;
   } else if (auto* widget = dynamic_cast<ZEPVidWidget*>(iObject)) {
     _pObject = iObject;
+    _pWidget = widget;
     _serial = widget->GetSerial();
   }
 }
 
 ZEPBaseUnknown* ZEPBaseUnknown_WR::Resolve() const {
-  if (!_pObject) return nullptr;
-  // The pointer is only compared until the registries say the object still lives there.
-  if (_command)
-    return ZEPCommand::IsLive(static_cast<ZEPCommand*>(_pObject), _serial) ? _pObject : nullptr;
-  return ZEPVidWidget::IsAlive(static_cast<ZEPVidWidget*>(_pObject), _serial) ? _pObject
-                                                                              : nullptr;
+  // The registries compare addresses only, so asking about a gone object is safe.
+  if (_pCommand) return ZEPCommand::IsLive(_pCommand, _serial) ? _pObject : nullptr;
+  if (_pWidget) return ZEPVidWidget::IsAlive(_pWidget, _serial) ? _pObject : nullptr;
+  return nullptr;
 }
 
 // ---- events -------------------------------------------------------------------------------------
@@ -191,8 +190,9 @@ ZEPDbsLegendTableLayoutVID::ZEPDbsLegendTableLayoutVID(ZEPCommand* iParent,
                                                        const ZEPString& iContext)
     : ZEPVidFraDialog(iParent, "LegendTableLayoutDialog"), _context(iContext) {}
 
-ZEPVidFraDialog* ZEPDbsLegendTableLayoutVID::CreateLegendTableLayoutDialog(
-    ZEPCommand* iParent, const ZEPString& iContext) {
+ZEPVidFraDialog*
+ZEPDbsLegendTableLayoutVID::CreateLegendTableLayoutDialog(ZEPCommand* iParent,
+                                                          const ZEPString& iContext) {
   if (Config().legendFails) return nullptr;
   return Register(new ZEPDbsLegendTableLayoutVID(iParent, iContext));
 }
@@ -230,8 +230,7 @@ bool Operable(ZEPVidFraDialog* iDialog) {
 
 bool ZEPDlgDriver::Accept(ZEPVidFraDialog* iDialog) {
   if (!Operable(iDialog)) return false;
-  if (auto* panel =
-          ZEPSysDynamicCast<ZEPDbsManageCustomListVID>(iDialog->GetApplicativeWidget())) {
+  if (auto* panel = ZEPSysDynamicCast<ZEPDbsManageCustomListVID>(iDialog->GetApplicativeWidget())) {
     ZEPSYPEventArgs args;
     panel->Raise(ZEPDbsManageCustomListVID::AcceptBtnPressed(),
                  Config().withoutArgs ? nullptr : &args);
@@ -243,8 +242,7 @@ bool ZEPDlgDriver::Accept(ZEPVidFraDialog* iDialog) {
 
 bool ZEPDlgDriver::Cancel(ZEPVidFraDialog* iDialog) {
   if (!Operable(iDialog)) return false;
-  if (auto* panel =
-          ZEPSysDynamicCast<ZEPDbsManageCustomListVID>(iDialog->GetApplicativeWidget())) {
+  if (auto* panel = ZEPSysDynamicCast<ZEPDbsManageCustomListVID>(iDialog->GetApplicativeWidget())) {
     ZEPSYPEventArgs args;
     panel->Raise(ZEPDbsManageCustomListVID::CancelBtnPressed(),
                  Config().withoutArgs ? nullptr : &args);

@@ -15,6 +15,7 @@
 #include <vector>
 
 class ZEPCommand;
+class ZEPVidWidget;
 
 // A weak reference: resolves to the object while it lives, to null once it is gone. Tracks
 // toolkit commands (pages, widgets) and newer dialog widgets; any other object resolves null.
@@ -26,9 +27,11 @@ public:
   void Clear() { *this = ZEPBaseUnknown_WR(); }
 
 private:
+  // Kept as taken while the object lived: a gone object is never cast or read.
   ZEPBaseUnknown* _pObject = nullptr;
+  const ZEPCommand* _pCommand = nullptr;
+  const ZEPVidWidget* _pWidget = nullptr;
   std::uint64_t _serial = 0;
-  bool _command = false;
 };
 
 // An event: identified by its name.

@@ -80,8 +80,8 @@ TEST_F(AnnotPage, CalloutSizeOverrunIsAPaperLengthWrittenOnlyByTheUser) {
   EXPECT_TRUE(_script.calls.empty()) << "opening the page writes nothing";
   ASSERT_TRUE(ZEPDlgDriver::Enter(spinner, 0.004));
   ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkEnableCreateCallout")));
-  ASSERT_EQ(Hooks(), (std::vector<std::string>{"SetSysCalloutSizeOverrun",
-                                               "SetSysEnableCreateCallout"}));
+  ASSERT_EQ(Hooks(),
+            (std::vector<std::string>{"SetSysCalloutSizeOverrun", "SetSysEnableCreateCallout"}));
   EXPECT_DOUBLE_EQ(_script.calls[0].values[0], 4.0);
   EXPECT_EQ(_script.calls[1].values[0], 0.0);
 }
@@ -114,8 +114,7 @@ TEST_F(AnnotPage, AreaFillRadiosWriteOncePerChange) {
     _script.values = {{"AreaFillOptimizationMode", {stored}}};
     auto* window = new ZEPDlgWindow(&_root, "window", 0);
     _pPage = OpenPage<RecordingAnnotPage>(_script, window);
-    EXPECT_EQ(Radio("radOptimImport")->GetState(),
-              stored == 1.0 ? ZEPDlgChecked : ZEPDlgUnchecked);
+    EXPECT_EQ(Radio("radOptimImport")->GetState(), stored == 1.0 ? ZEPDlgChecked : ZEPDlgUnchecked);
     EXPECT_EQ(Radio("radOptimGenAndGeo")->GetState(), ZEPDlgUnchecked) << stored;
     delete window;
   }
@@ -146,8 +145,8 @@ TEST_F(AnnotPage, EachDialogOpensOnceAndEveryEndingFreesBothButtons) {
     if (auto* legend = ZEPSysDynamicCast<ZEPDbsLegendTableLayoutVID>(dialog))
       EXPECT_EQ(legend->GetContext(), "SheetLegend");
     else
-      EXPECT_TRUE(ZEPSysDynamicCast<ZEPDbsManageCustomListVID>(dialog->GetApplicativeWidget())
-                      ->IsBuilt());
+      EXPECT_TRUE(
+          ZEPSysDynamicCast<ZEPDbsManageCustomListVID>(dialog->GetApplicativeWidget())->IsBuilt());
     // While it is open, neither button opens anything.
     for (const char* other : kButtons)
       EXPECT_EQ(Press(other), dialog);

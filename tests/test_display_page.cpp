@@ -5,13 +5,25 @@
 
 namespace {
 // The analysed states, in dialog order.
-const char* const kStates[] = {
-    "AnnotDelGeom",       "AnnotUnloadGeom",         "AnnotInvalid",      "DimNotUpToDate",
-    "DimNonAssoc",        "DimIsolated",             "DimBroken",         "DimFake",
-    "DimDriving",         "Dim3DCst",                "TechFeatDim",       "DimTrue",
-    "DimOnNonVisGeom",    "DimClipped",              "FilterGeneratedElements",
-    "CalloutLastUpdateFailed", "IsolatedCallout",    "NotPerpendicularCallout",
-    "DrwWeldNotUpToDate"};
+const char* const kStates[] = {"AnnotDelGeom",
+                               "AnnotUnloadGeom",
+                               "AnnotInvalid",
+                               "DimNotUpToDate",
+                               "DimNonAssoc",
+                               "DimIsolated",
+                               "DimBroken",
+                               "DimFake",
+                               "DimDriving",
+                               "Dim3DCst",
+                               "TechFeatDim",
+                               "DimTrue",
+                               "DimOnNonVisGeom",
+                               "DimClipped",
+                               "FilterGeneratedElements",
+                               "CalloutLastUpdateFailed",
+                               "IsolatedCallout",
+                               "NotPerpendicularCallout",
+                               "DrwWeldNotUpToDate"};
 const char* const kDiagColors[] = {"OverConsElts", "InconsElts", "NotChanElts", "IsoConsElts"};
 
 class DisplayPage : public ZEPHostTest {
@@ -36,7 +48,9 @@ protected:
   ZEPDlgDialog* AnalysisDialog() {
     return OpenDialog("diagElementsColorsPushButton", "dlgAnalysisDisplay");
   }
-  ZEPDlgDialog* DiagDialog() { return OpenDialog("diagGeometriesColorsPushButton", "dlgVisuDiagColor"); }
+  ZEPDlgDialog* DiagDialog() {
+    return OpenDialog("diagGeometriesColorsPushButton", "dlgVisuDiagColor");
+  }
   bool Checked(const std::string& iName) {
     auto* check = ZEPSysDynamicCast<ZEPDlgCheckButton>(Control(iName));
     auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(Control(iName));
@@ -73,11 +87,16 @@ TEST_F(DisplayPage, ModuleHooksBuildOnlyTheControlsThatNeedNoAnswer) {
 
 TEST_F(DisplayPage, InfoZeroHostWithBothDialogsOpen) {
   _script.allInfoSet = true;
-  _script.values = {{"DimAnalysisDisplay", {1}},  {"VisuDiagnostic", {1}},
-                    {"DimDriving", {1}},          {"DimDrivingColor", {255, 0, 0}},
-                    {"AnnotInSpecTreePlane", {1}}, {"PatternContourPitch", {1}},
-                    {"PatternContourPitchThickness", {3}}, {"OverConsElts", {255, 0, 255}},
-                    {"CappingColor", {0, 128, 0}}, {"BackgroundInViewFrameMode", {2}}};
+  _script.values = {{"DimAnalysisDisplay", {1}},
+                    {"VisuDiagnostic", {1}},
+                    {"DimDriving", {1}},
+                    {"DimDrivingColor", {255, 0, 0}},
+                    {"AnnotInSpecTreePlane", {1}},
+                    {"PatternContourPitch", {1}},
+                    {"PatternContourPitchThickness", {3}},
+                    {"OverConsElts", {255, 0, 255}},
+                    {"CappingColor", {0, 128, 0}},
+                    {"BackgroundInViewFrameMode", {2}}};
   Open();
   std::string dump = ZEPDlgDriver::Dump(_pPage);
   dump += ZEPDlgDriver::Dump(AnalysisDialog());
@@ -180,8 +199,9 @@ TEST_F(DisplayPage, PageChecksAndTheirDependants) {
     EXPECT_EQ(Control(c.dependant)->IsEffectivelyEnabled(), !on) << c.dependant;
   }
   EXPECT_TRUE(Checked("checkAnnotInSpecTreeAnnotSet")) << "disabled, its value kept";
-  EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysAnnotInSpecTreePlane", "SetSysDimAnalysisDisplay",
-                                               "SetSysVisuDiagnostic", "SetSysBackgroundInViewFrame"}));
+  EXPECT_EQ(Hooks(),
+            (std::vector<std::string>{"SetSysAnnotInSpecTreePlane", "SetSysDimAnalysisDisplay",
+                                      "SetSysVisuDiagnostic", "SetSysBackgroundInViewFrame"}));
 }
 
 TEST_F(DisplayPage, RadioPairsShowTheirValueAndWriteOncePerChange) {
@@ -312,8 +332,8 @@ TEST_F(DisplayPage, PatternPitchWeightAndDiagnosisColours) {
       ->GetSelectedColor(&rgb[0], &rgb[1], &rgb[2]);
   EXPECT_NE(std::vector<unsigned int>(rgb, rgb + 3), (std::vector<unsigned int>{255, 0, 0}));
   for (const char* name : kDiagColors)
-    ASSERT_TRUE(ZEPDlgDriver::SelectColor(ZEPDlgDriver::FindControl(diag, std::string("cmb") + name),
-                                          255, 128, 0));
+    ASSERT_TRUE(ZEPDlgDriver::SelectColor(
+        ZEPDlgDriver::FindControl(diag, std::string("cmb") + name), 255, 128, 0));
   ASSERT_EQ(_script.calls.size(), 6u);
   EXPECT_EQ(_script.calls[1].hook, "SetSysPatternContourPitchThickness");
   EXPECT_EQ(_script.calls[1].values[0], 5.0);
@@ -341,8 +361,10 @@ TEST_F(DisplayPage, DialogsOpenOnceAndLocksHoldInside) {
   EXPECT_TRUE(ZEPDlgDriver::FindControl(analysis, "cmbDimFake")->IsEffectivelyEnabled());
   EXPECT_FALSE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(analysis, "chkPatternContourPitch")));
   ZEPDlgDialog* diag = DiagDialog();
-  EXPECT_FALSE(ZEPDlgDriver::SelectColor(ZEPDlgDriver::FindControl(diag, "cmbIsoConsElts"), 1, 1, 1));
-  EXPECT_TRUE(ZEPDlgDriver::SelectColor(ZEPDlgDriver::FindControl(diag, "cmbNotChanElts"), 1, 1, 1));
+  EXPECT_FALSE(
+      ZEPDlgDriver::SelectColor(ZEPDlgDriver::FindControl(diag, "cmbIsoConsElts"), 1, 1, 1));
+  EXPECT_TRUE(
+      ZEPDlgDriver::SelectColor(ZEPDlgDriver::FindControl(diag, "cmbNotChanElts"), 1, 1, 1));
   // Disabling the button leaves the open dialog open.
   ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkDesignMode")));
   EXPECT_TRUE(analysis->IsEffectivelyEnabled());

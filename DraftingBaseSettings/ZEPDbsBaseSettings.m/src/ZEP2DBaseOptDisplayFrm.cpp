@@ -45,7 +45,8 @@ struct ZEP2DBaseOptDisplayFrm::StateRow {
   const char* name;
   int state, color;
 };
-#define ZEP_STATE_ROW(Frame, Name) {Frame, #Name, kSlot##Name, kSlot##Name##Color}
+#define ZEP_STATE_ROW(Frame, Name)                                                                 \
+  { Frame, #Name, kSlot##Name, kSlot##Name##Color }
 // Dialog order, which is not the order of the hooks.
 const ZEP2DBaseOptDisplayFrm::StateRow ZEP2DBaseOptDisplayFrm::kStateRows[] = {
     ZEP_STATE_ROW(kFrameDim, AnnotDelGeom),
@@ -106,9 +107,12 @@ const ZEPSettingSlotHooks<ZEP2DBaseOptDisplayFrm>& ZEP2DBaseOptDisplayFrm::Hooks
 const ZEP2DBaseOptDisplayFrm::ColorHooks& ZEP2DBaseOptDisplayFrm::ColorHooksOf(int iSlot) {
   using P = ZEP2DBaseOptDisplayFrm;
 #define ZEP_VALUE_HOOKS_Flag(Name) {nullptr, nullptr, nullptr, nullptr, nullptr, nullptr},
-#define ZEP_VALUE_HOOKS_Int(Name) {&P::GetSys##Name, &P::SetSys##Name, nullptr, nullptr, nullptr, nullptr},
-#define ZEP_VALUE_HOOKS_ColorInt(Name) {nullptr, nullptr, &P::GetSys##Name, &P::SetSys##Name, nullptr, nullptr},
-#define ZEP_VALUE_HOOKS_ColorUInt(Name) {nullptr, nullptr, nullptr, nullptr, &P::GetSys##Name, &P::SetSys##Name},
+#define ZEP_VALUE_HOOKS_Int(Name)                                                                  \
+  {&P::GetSys##Name, &P::SetSys##Name, nullptr, nullptr, nullptr, nullptr},
+#define ZEP_VALUE_HOOKS_ColorInt(Name)                                                             \
+  {nullptr, nullptr, &P::GetSys##Name, &P::SetSys##Name, nullptr, nullptr},
+#define ZEP_VALUE_HOOKS_ColorUInt(Name)                                                            \
+  {nullptr, nullptr, nullptr, nullptr, &P::GetSys##Name, &P::SetSys##Name},
   static const ColorHooks hooks[] = {
 #define ZEP_SETTING(Name, Kind) ZEP_VALUE_HOOKS_##Kind(Name)
 #include "ZEP2DBaseOptDisplayFrm.def"
@@ -165,8 +169,7 @@ ZEPDrwLockCheckButton* ZEP2DBaseOptDisplayFrm::Check(ZEPDialog* iFrame, int iSlo
 
 ZEPDrwLockComboColor* ZEP2DBaseOptDisplayFrm::ColorCombo(ZEPDialog* iFrame, int iSlot,
                                                          const char* iName, short iRow,
-                                                         short iColumn,
-                                                         unsigned int iJustification,
+                                                         short iColumn, unsigned int iJustification,
                                                          ZEPSettingInfo& ioInfo) {
   (this->*Hooks(iSlot).info)(ioInfo);
   auto* combo = new ZEPDrwLockComboColor(iFrame, iName, ioInfo);
@@ -250,7 +253,8 @@ void ZEP2DBaseOptDisplayFrm::BuildDesignMode(int& ioRow, ZEPSettingInfo& ioInfo)
 
 void ZEP2DBaseOptDisplayFrm::BuildVisualization(int& ioRow, ZEPSettingInfo& ioInfo) {
   ZEPDlgFrame* frame = Section(this, "frameVisulization", "I_DbsEmptyIcon", ioRow++);
-  Check(frame, kSlotDisplayBackAndCutting, "chkDisplayBackAndCutting", 0, 0, 2, 0x1E, ioInfo, false);
+  Check(frame, kSlotDisplayBackAndCutting, "chkDisplayBackAndCutting", 0, 0, 2, 0x1E, ioInfo,
+        false);
   Check(frame, kSlotPropagateHighlight, "chkPropagateHighlight", 1, 0, 2, 0x1E, ioInfo, false);
   Check(frame, kSlotBackgroundInViewFrame, "chkBackgroundInViewFrame", 2, 0, 2, 0x1E, ioInfo,
         false);
@@ -300,10 +304,11 @@ void ZEP2DBaseOptDisplayFrm::BuildDlgAnalysisDisplay(ZEPDlgDialog* iDialog,
     const char* icon;
     unsigned char (ZEP2DBaseOptDisplayFrm::*with)();
   };
-  static const FrameOf frames[] = {{"frameDimColor", "I_ColorChooser", nullptr},
-                                   {"frameGeometries", "", &ZEP2DBaseOptDisplayFrm::WithFrmGeometries},
-                                   {"frameCallouts", "", &ZEP2DBaseOptDisplayFrm::WithFrmCallouts},
-                                   {"frameWelding", "", &ZEP2DBaseOptDisplayFrm::WithFrmWelding}};
+  static const FrameOf frames[] = {
+      {"frameDimColor", "I_ColorChooser", nullptr},
+      {"frameGeometries", "", &ZEP2DBaseOptDisplayFrm::WithFrmGeometries},
+      {"frameCallouts", "", &ZEP2DBaseOptDisplayFrm::WithFrmCallouts},
+      {"frameWelding", "", &ZEP2DBaseOptDisplayFrm::WithFrmWelding}};
   for (short f = 0; f < 4; ++f) {
     if (frames[f].with && !(this->*frames[f].with)()) continue;
     ZEPDlgFrame* frame = Section(iDialog, frames[f].name, frames[f].icon, f);
@@ -312,8 +317,8 @@ void ZEP2DBaseOptDisplayFrm::BuildDlgAnalysisDisplay(ZEPDlgDialog* iDialog,
     for (const StateRow& state : kStateRows) {
       if (state.frame != f) continue;
       const std::string name = state.name;
-      ZEPDrwLockCheckButton* check = Check(frame, state.state, ("chk" + name).c_str(), row, 0, 1,
-                                           0x02, ioInfo, true);
+      ZEPDrwLockCheckButton* check =
+          Check(frame, state.state, ("chk" + name).c_str(), row, 0, 1, 0x02, ioInfo, true);
       if (!check) continue;
       ZEPDrwLockComboColor* combo =
           ColorCombo(frame, state.color, ("cmb" + name).c_str(), row, 1, 0x04, ioInfo);
@@ -329,7 +334,8 @@ void ZEP2DBaseOptDisplayFrm::BuildDlgAnalysisDisplay(ZEPDlgDialog* iDialog,
   if (!frame) return;
   Check(frame, kSlotPatternContourPitch, "chkPatternContourPitch", 0, 0, 1, 0x02, ioInfo, false);
   GetSysPatternContourPitchThicknessInfo(ioInfo);
-  _pCmbPatternContourPitch = new ZEPDrwLockComboWeight(frame, "cmbPatternContourPitch", ioInfo, 1, 0);
+  _pCmbPatternContourPitch =
+      new ZEPDrwLockComboWeight(frame, "cmbPatternContourPitch", ioInfo, 1, 0);
   _pCmbPatternContourPitch->SetGridConstraints(0, 1, 1, 1, 0x04);
   _pCmbPatternContourPitch->SetVisibleTextHeight(8);
   _pCmbPatternContourPitch->SetVisibleTextWidth(8);
