@@ -1,6 +1,8 @@
 // Page costs: building and initialising each page, and one user change reaching its hook.
 #include "ZEP2DBaseOptDimFrm.h"
 #include "ZEP2DBaseOptAdminFrm.h"
+#include "ZEP2DBaseOptAnnotFrm.h"
+#include "ZEP2DBaseOptDisplayFrm.h"
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
@@ -9,6 +11,9 @@
 #include "ZEP2DBasePrimaryViewFrm.h"
 
 #include <benchmark/benchmark.h>
+
+#include <string>
+#include <vector>
 
 namespace {
 // A host whose hooks answer at once: what is measured is the page and the toolkit.
@@ -174,3 +179,89 @@ void MainChooseStandard(benchmark::State& state) {
   if (page->_writes == 0) state.SkipWithError("no standard was written");
 }
 BENCHMARK(MainChooseStandard);
+// ---- annotation and display pages ----------------------------------------------------------------
+namespace {
+// As above; the info hooks answer what Status says, so that a page may choose its layout.
+#define ZEP_SETTING(Name, Kind)                                                                     \
+  long SetSys##Name(ZEP_SETPARAMS(Kind)) override {                                                 \
+    ZEPHookDefaults::Ignore(ZEP_SETARGS(Kind));                                                     \
+    ++_writes;                                                                                      \
+    return S_OK;                                                                                    \
+  }                                                                                                 \
+  long GetSys##Name##Info(ZEPSettingInfo&) override { return Status(#Name); }
+
+// The annotation layout (the larger one).
+struct AnnotPage : ZEP2DBaseOptAnnotFrm {
+  explicit AnnotPage(ZEPDialog* iParent) : ZEP2DBaseOptAnnotFrm(iParent, "AnnotationPage") {}
+  long _writes = 0;
+  static long Status(const char* iName) {
+    return std::string(iName) == "CalloutSizeOverrun" ? 1 : S_OK;
+  }
+  ZEPString GetLegendTableLayoutContext() override { return "DrwLegend"; }
+#include "ZEP2DBaseOptAnnotFrm.def"
+};
+
+// Every optional control and frame; both dialog buttons enabled.
+struct DisplayPage : ZEP2DBaseOptDisplayFrm {
+  explicit DisplayPage(ZEPDialog* iParent) : ZEP2DBaseOptDisplayFrm(iParent, "DisplayPage") {}
+  long _writes = 0;
+  static long Status(const char*) { return S_OK; }
+  void Build() {
+    int row = 0;
+    ZEP2DBaseOptDisplayFrm::Build(row, 1);
+  }
+  long GetSysDimAnalysisDisplay(unsigned char& oValue) override { return oValue = 1, S_OK; }
+  long GetSysVisuDiagnostic(unsigned char& oValue) override { return oValue = 1, S_OK; }
+  unsigned char WithFrmVisualization() override { return 1; }
+  unsigned char WithFrmGeometries() override { return 1; }
+  unsigned char WithFrmCallouts() override { return 1; }
+  unsigned char WithFrmWelding() override { return 1; }
+  unsigned char WithFrmPatterns() override { return 1; }
+  unsigned char WithFrmCapping() override { return 1; }
+#include "ZEP2DBaseOptDisplayFrm.def"
+};
+#undef ZEP_SETTING
+
+// The display page built and initialised, then both its dialogs opened.
+void DisplayWithDialogsOpen(benchmark::State& state) {
+  ZEPDlgWindow root(nullptr, "root", 0);
+  for (auto _ : state) {
+    auto* page = new DisplayPage(&root);
+    page->Build();
+    page->Initialize();
+    ZEPDlgDriver::Click(ZEPDlgDriver::Find(page, "diagElementsColorsPushButton"));
+    ZEPDlgDriver::Click(ZEPDlgDriver::Find(page, "diagGeometriesColorsPushButton"));
+    if (!ZEPDlgDriver::Find(page, "cmbIsoConsElts")) state.SkipWithError("a dialog did not open");
+    delete page;
+  }
+}
+
+// A dialog of the newer framework opened and accepted.
+void AnnotLegendDialogRoundTrip(benchmark::State& state) {
+  ZEPDlgWindow root(nullptr, "root", 0);
+  auto* page = new AnnotPage(&root);
+  page->Build();
+  page->Initialize();
+  ZEPDialog* button = ZEPDlgDriver::Find(page, "pushLegendTableLayout");
+  for (auto _ : state) {
+    ZEPDlgDriver::Click(button);
+    const std::vector<ZEPVidFraWindow*> open = ZEPVidFraWindow::Windows();
+    if (open.empty() || !ZEPDlgDriver::Accept(ZEPSysDynamicCast<ZEPVidFraDialog>(open.back())))
+      state.SkipWithError("the dialog did not open");
+    ZEPDlgDriver::Idle();
+  }
+}
+void AnnotClickTableResize(benchmark::State& state) {
+  ClickToHook<AnnotPage>(state, "chkTableResize");
+}
+void DisplayClickDesignMode(benchmark::State& state) {
+  ClickToHook<DisplayPage>(state, "checkDesignMode");
+}
+} // namespace
+
+BENCHMARK_TEMPLATE(BuildAndInitialize, AnnotPage);
+BENCHMARK_TEMPLATE(BuildAndInitialize, DisplayPage);
+BENCHMARK(DisplayWithDialogsOpen);
+BENCHMARK(AnnotLegendDialogRoundTrip);
+BENCHMARK(AnnotClickTableResize);
+BENCHMARK(DisplayClickDesignMode);

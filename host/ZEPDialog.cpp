@@ -53,6 +53,10 @@ bool IsAlive(const ZEPCommand* iCommand, std::uint64_t iSerial) {
 
 ZEPCommand::ZEPCommand() : _serial(NextSerial()) { Live()[this] = _serial; }
 
+bool ZEPCommand::IsLive(const ZEPCommand* iCommand, std::uint64_t iSerial) {
+  return IsAlive(iCommand, iSerial);
+}
+
 ZEPCommand::~ZEPCommand() {
   Live().erase(this);
   for (const Sender& s : _senders) {

@@ -69,6 +69,11 @@ public:
   // A father that is destroyed first is forgotten, never reached.
   void SetFather(ZEPCommand* iFather);
 
+  // Identity of this command for references that must notice its end (see IsLive).
+  std::uint64_t GetSerial() const { return _serial; }
+  // True while the command of that serial lives at that address.
+  static bool IsLive(const ZEPCommand* iCommand, std::uint64_t iSerial);
+
   // Sends iNotif from this command: the callbacks registered for it on this command run,
   // then those on each father in turn, each with the command it was registered on as sender.
   void SendNotification(ZEPNotification* iNotif);

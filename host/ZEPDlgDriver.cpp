@@ -1,5 +1,6 @@
 #include "ZEPDlgDriver.h"
 #include "ZEPSettings.h"
+#include "ZEPVidDialogs.h"
 
 #include <cmath>
 
@@ -157,7 +158,10 @@ bool ZEPDlgDriver::CloseDialog(ZEPDialog* iDialog) {
   return true;
 }
 
-void ZEPDlgDriver::Idle() { ZEPDialog::RunDelayedDestructions(); }
+void ZEPDlgDriver::Idle() {
+  ZEPDialog::RunDelayedDestructions();
+  ZEPVidFraWindow::RunDelayedDestructions();
+}
 
 namespace {
 std::string QuoteText(const std::string& s) {

@@ -5,6 +5,8 @@
 
 #include <string>
 
+class ZEPVidFraDialog;
+
 // Every action on a widget that is not effectively enabled is refused: nothing changes,
 // no notification is sent and the action answers false.
 class ZEPDlgDriver {
@@ -32,8 +34,14 @@ public:
   static bool Close(ZEPDialog* iDialog);
   // The dialog's own Close button (dialog close notification).
   static bool CloseDialog(ZEPDialog* iDialog);
-  // Runs the delayed destructions.
+  // Runs the delayed destructions, of toolkit widgets and of newer dialogs.
   static void Idle();
+
+  // Newer dialogs (ZEPVidDialogs.h): the accept, cancel and reject buttons. Refused for a
+  // dialog that is hidden or ending.
+  static bool Accept(ZEPVidFraDialog* iDialog);
+  static bool Cancel(ZEPVidFraDialog* iDialog);
+  static bool Reject(ZEPVidFraDialog* iDialog);
 
   // Why the user cannot operate the widget: "" when it can be operated, else a sentence
   // ("locked by ...", "disabled", "hidden").

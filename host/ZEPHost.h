@@ -13,3 +13,4 @@
 #include "ZEPMessageBox.h"
 #include "ZEPPLMServices.h"
 #include "ZEPDfuScaleToolbox.h"
+#include "ZEPVidDialogs.h"

@@ -45,6 +45,7 @@ protected:
     unsetenv("ZEP_TDE_LA");
     ZEPPLMSetup::Reset();
     ZEPScaleToolboxSetup::Reset();
+    ZEPVidSetup::Reset();
   }
   // A top-level window that owns what a test builds on it.
   ZEPDlgWindow _root{nullptr, "root", 0};

@@ -582,3 +582,44 @@ TEST_F(AppCli, BehaviorDialogRowsAreSetThroughTheirLines) {
   // The dialog's place is among the user's preferences.
   EXPECT_NE(ReadBytes(_settings).find("dlgPropTbBehaviorHeight"), std::string::npos);
 }
+
+// ---- annotation and display pages ----------------------------------------------------------------
+TEST_F(AppCli, DisplayColoursAreTypedAsNumbersHexOrLines) {
+  const struct {
+    const char* value;
+    const char* shown;
+  } cases[] = {{"10 20 30", "RGB 10,20,30"}, {"#FF8000", "RGB 255,128,0"}, {"red", "Red"},
+               {"3", "Red"}, {"0,0,255", "Blue"}};
+  for (const auto& c : cases) {
+    Result set = Run({"set", "display", "cmbCappingColor", c.value});
+    ASSERT_EQ(set.code, kExitOk) << c.value << set.err;
+    EXPECT_EQ(Run({"get", "display", "cmbCappingColor"}).out, std::string(c.shown) + "\n");
+  }
+  for (const char* bad : {"256 0 0", "#GG0000", "1 2", "chartreuse"})
+    EXPECT_EQ(Run({"set", "display", "cmbCappingColor", bad}).code, kExitBadValue) << bad;
+  // The diagnosis colours are the sketcher's: it reads what the page wrote.
+  ASSERT_EQ(Run({"set", "display", "cmbOverConsElts", "1 2 3"}).code, kExitOk);
+  EXPECT_NE(Run({"sketcher"}).out.find("1 2 3 (#010203)"), std::string::npos);
+  // A state's colour and the contour weight wait for their check box.
+  Result refused = Run({"set", "display", "cmbDimTrue", "red"});
+  EXPECT_EQ(refused.code, kExitRefused);
+  EXPECT_NE(refused.err.find("(chkDimTrue) on first"), std::string::npos) << refused.err;
+  ASSERT_EQ(Run({"set", "display", "chkPatternContourPitch", "on"}).code, kExitOk);
+  ASSERT_EQ(Run({"set", "display", "cmbPatternContourPitch", "3"}).code, kExitOk);
+  EXPECT_EQ(Run({"get", "display", "cmbPatternContourPitch"}).out, "Weight 3\n");
+}
+
+TEST_F(AppCli, NewerDialogsOpenAndEndEveryWayLeavingThePageOperable) {
+  for (const char* page : {"annotation", "callouts"})
+    for (const char* action : {"accept", "cancel", "reject"}) {
+      Result r = Run({"set", page, "pushLegendTableLayout", action});
+      ASSERT_EQ(r.code, kExitOk) << page << " " << action << r.err;
+      EXPECT_NE(r.out.find(" and closed"), std::string::npos) << r.out;
+    }
+  Result lists = Run({"set", "annotation", "pushTableSortCustomLists", "accept"});
+  ASSERT_EQ(lists.code, kExitOk) << lists.err;
+  EXPECT_NE(lists.out.find("\"Months\""), std::string::npos) << lists.out;
+  EXPECT_EQ(Run({"set", "annotation", "pushTableSortCustomLists", "open"}).code, kExitOk);
+  EXPECT_EQ(Run({"set", "annotation", "pushTableSortCustomLists", "press"}).code, kExitBadValue);
+  EXPECT_EQ(Run({"set", "callouts", "pushTableSortCustomLists", "open"}).code, kExitUsage);
+}

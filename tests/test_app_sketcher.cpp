@@ -27,6 +27,18 @@ Values ReadAll(Adapt& iAdapt) {
     v[Adapt::mstrGridVPrSpacing].push_back(iAdapt.GetGridVPrimSpac(r));
     v[Adapt::mstrGridVSecStep].push_back(iAdapt.GetGridVSecStep(r));
   }
+  // The diagnosis of sketch geometry, which the display page shows.
+  v[Adapt::mstrDiagElts] = {double(iAdapt.GetDiagElts())};
+  const std::pair<ZEP2DCstDiag, const char*> diags[] = {
+      {ZEP2DCstOverDefined, Adapt::mstrColorDiagOverDefinedElts},
+      {ZEP2DCstNotConsistent, Adapt::mstrColorDiagNotConsistentElts},
+      {ZEP2DCstNotChanged, Adapt::mstrColorDiagNotChangedElts},
+      {ZEP2DCstWellDefined, Adapt::mstrColorDiagWellDefinedElts}};
+  for (const auto& d : diags) {
+    unsigned int r = 0, g = 0, b = 0;
+    iAdapt.GetColorDiagElts(d.first, &r, &g, &b);
+    v[d.second] = {double(r), double(g), double(b)};
+  }
   return v;
 }
 

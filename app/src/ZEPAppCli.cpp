@@ -421,7 +421,8 @@ int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
   const ZEPAppSetting* setting = SettingOf(*page, control->name);
   if (setting && setting->defaults.size() > 1 && range)
     out << "  (scale range " << range << ": " << ScaleName(range) << ")";
-  if (!setting) out << "  (only for this run: it stores nothing; --range N chooses a range)";
+  if (!setting && !control->opensNewerDialog)
+    out << "  (only for this run: it stores nothing; --range N chooses a range)";
   out << "\n";
   return kExitOk;
 }

@@ -2,6 +2,7 @@
 
 #include "ZEP2DBaseRangeCmb.h"
 #include "ZEPDrwLockDialog.h"
+#include "ZEPDrwLockFrame.h"
 #include "ZEPDrwLockLabel.h"
 
 #include <algorithm>
@@ -156,6 +157,22 @@ const Dependency kDependencies[] = {
     {"cstTypesPushButton", "checkCstVisu", true, false},
     {"editorDimLinePosValue", "checkDimSketch", false, false},
     {"checkLineUpAutoFunnel", "checkLineUpCumulVal", true, false},
+    {"checkAnnotInSpecTreeAnnotSet", "checkAnnotInSpecTreePlane", true, false},
+    {"diagElementsColorsPushButton", "checkDesignMode", true, false},
+    {"diagGeometriesColorsPushButton", "checkVisualizationDiag", true, false},
+    {"cmbPatternContourPitch", "chkPatternContourPitch", true, false},
+#define ZEP_APP_STATE_DEPENDENCY(Name) {"cmb" #Name, "chk" #Name, true, false},
+    ZEP_APP_STATE_DEPENDENCY(AnnotDelGeom) ZEP_APP_STATE_DEPENDENCY(AnnotUnloadGeom)
+    ZEP_APP_STATE_DEPENDENCY(AnnotInvalid) ZEP_APP_STATE_DEPENDENCY(DimNotUpToDate)
+    ZEP_APP_STATE_DEPENDENCY(DimNonAssoc) ZEP_APP_STATE_DEPENDENCY(DimIsolated)
+    ZEP_APP_STATE_DEPENDENCY(DimBroken) ZEP_APP_STATE_DEPENDENCY(DimFake)
+    ZEP_APP_STATE_DEPENDENCY(DimDriving) ZEP_APP_STATE_DEPENDENCY(Dim3DCst)
+    ZEP_APP_STATE_DEPENDENCY(TechFeatDim) ZEP_APP_STATE_DEPENDENCY(DimTrue)
+    ZEP_APP_STATE_DEPENDENCY(DimOnNonVisGeom) ZEP_APP_STATE_DEPENDENCY(DimClipped)
+    ZEP_APP_STATE_DEPENDENCY(FilterGeneratedElements)
+    ZEP_APP_STATE_DEPENDENCY(CalloutLastUpdateFailed) ZEP_APP_STATE_DEPENDENCY(IsolatedCallout)
+    ZEP_APP_STATE_DEPENDENCY(NotPerpendicularCallout) ZEP_APP_STATE_DEPENDENCY(DrwWeldNotUpToDate)
+#undef ZEP_APP_STATE_DEPENDENCY
     {"chkGVSParamOverride", "chkPreventGVS", false, false},
     {"chkPrevViewGeomUpgrade", "chkPreventViewUpgrade", false, false},
     {"frmViewNameUnicityScope", "checkViewNamesUnicity", true, false},
@@ -187,6 +204,9 @@ const ChoiceRule kChoiceRules[] = {
     {"chkShowWarningSelectionOutAssembly", "frmSelectionOnCurrentAssembly", {1, 2}},
     {"chkShowWarningSelectionOutFavoriteContext", "frmSelectionOnCurrentAssembly", {2}},
 };
+
+// Buttons that open a dialog of the newer framework, which the command line opens and ends.
+const char* const kNewerDialogButtons[] = {"pushTableSortCustomLists", "pushLegendTableLayout"};
 
 // The radio buttons of a group frame, in screen order.
 std::vector<ZEPDlgRadioButton*> Radios(ZEPDialog* iGroup) {
@@ -231,8 +251,12 @@ void Walk(ZEPDialog* iWidget, std::string iSection, std::vector<ZEPAppControl>& 
   if (auto* section = ZEPSysDynamicCast<ZEPDlgToolsOptionsFrame>(iWidget))
     iSection = section->GetTitle().str();
   if (auto* lockAware = dynamic_cast<ZEPDrwLockDialog*>(iWidget)) {
-    if (ZEPDialog* inner = lockAware->GetDialog())
-      oControls.push_back({iWidget->GetOwnName(), iWidget, inner, lockAware, iSection});
+    ZEPDialog* inner = lockAware->GetDialog();
+    if (inner) oControls.push_back({iWidget->GetOwnName(), iWidget, inner, lockAware, iSection});
+    // A padlocked group may hold controls of their own beside its radio buttons.
+    if (inner && dynamic_cast<ZEPDrwLockFrame*>(iWidget))
+      for (ZEPDialog* child : inner->GetChildren())
+        if (!ZEPSysDynamicCast<ZEPDlgRadioButton>(child)) Walk(child, iSection, oControls);
     return;
   }
   if (dynamic_cast<ZEPDrwLockLabel*>(iWidget)) return; // a caption
@@ -325,6 +349,12 @@ std::string ZEPAppControl::Accepts() const {
   case ZEPAppKind::Combo:
   case ZEPAppKind::Choice: {
     const std::vector<std::string> lines = Choices(*this);
+    if (ZEPSysDynamicCast<ZEPComboColor>(inner)) {
+      std::string text = "a colour as \"R G B\" (0 to 255 each) or #RRGGBB, or one of its lines:";
+      for (std::size_t i = 0; i < lines.size(); ++i)
+        text += "\n  " + std::to_string(i + 1) + "  " + lines[i];
+      return text;
+    }
     const char* what = Kind() == ZEPAppKind::Combo ? "line" : "choice";
     std::string text = std::string("a ") + what + " number from 1 to " +
                        std::to_string(lines.size()) + " or the text of a " + what + ":";
@@ -333,6 +363,8 @@ std::string ZEPAppControl::Accepts() const {
     return text;
   }
   case ZEPAppKind::Push:
+    if (opensNewerDialog)
+      return "open, accept, cancel or reject: what to do with the dialog it opens";
     return "nothing: it is a button that opens a dialog; set the controls listed under that dialog";
   case ZEPAppKind::Other:
     break;
@@ -354,6 +386,9 @@ std::vector<ZEPAppControl> PageControls(ZEPDialog* iPage,
 
   for (ZEPDialog* child : iPage->GetChildren())
     Walk(child, "", controls);
+  for (ZEPAppControl& c : controls)
+    for (const char* name : kNewerDialogButtons)
+      c.opensNewerDialog = c.opensNewerDialog || c.name == name;
   for (const std::string& name : iDialogButtons) {
     ZEPDialog* button = ZEPDlgDriver::Find(iPage, name);
     if (!button || !button->IsEffectivelyEnabled()) continue; // its dialog cannot be opened now
@@ -565,6 +600,93 @@ int FindLine(const std::vector<std::string>& iLines, const std::string& iText) {
   return -1;
 }
 
+// A colour typed by the user: "R G B" (0 to 255 each, commas allowed) or "#RRGGBB". False when
+// the text is neither (it may still be the text of a line).
+bool ParseColor(const std::string& iText, unsigned int oRgb[3]) {
+  std::string text = Trim(iText);
+  if (text.size() == 7 && text[0] == '#') {
+    for (std::size_t i = 1; i < 7; ++i)
+      if (!std::isxdigit(static_cast<unsigned char>(text[i]))) return false;
+    const unsigned long v = std::strtoul(text.c_str() + 1, nullptr, 16);
+    oRgb[0] = (v >> 16) & 0xFF;
+    oRgb[1] = (v >> 8) & 0xFF;
+    oRgb[2] = v & 0xFF;
+    return true;
+  }
+  for (char& c : text)
+    if (c == ',') c = ' ';
+  int count = 0;
+  std::size_t at = 0;
+  while (count < 4) {
+    at = text.find_first_not_of(' ', at);
+    if (at == std::string::npos) break;
+    const std::size_t end = std::min(text.find(' ', at), text.size());
+    const std::string word = text.substr(at, end - at);
+    if (word.size() > 3 || !std::all_of(word.begin(), word.end(), [](char c) {
+          return std::isdigit(static_cast<unsigned char>(c));
+        }))
+      return false;
+    if (count < 3) oRgb[count] = static_cast<unsigned int>(std::atoi(word.c_str()));
+    ++count;
+    at = end;
+  }
+  return count == 3;
+}
+
+// The dialog of the newer framework the page opened last and still shows; null if none.
+ZEPVidFraDialog* ShownNewerDialog(const std::vector<ZEPVidFraWindow*>& iBefore) {
+  ZEPVidFraDialog* found = nullptr;
+  for (ZEPVidFraWindow* w : ZEPVidFraWindow::Windows())
+    if (w->IsVisible() && !w->IsDestructionRequested() &&
+        std::find(iBefore.begin(), iBefore.end(), w) == iBefore.end())
+      found = ZEPSysDynamicCast<ZEPVidFraDialog>(w);
+  return found;
+}
+
+// A button that opens a dialog of the newer framework: opened through the button, then ended
+// as asked, the way a user does it.
+ZEPAppOutcome OperateNewerDialog(const ZEPAppControl& iControl, const std::string& iText) {
+  const std::string word = Lower(Trim(iText));
+  bool (*end)(ZEPVidFraDialog*) = nullptr;
+  if (word == "accept" || word == "ok")
+    end = &ZEPDlgDriver::Accept;
+  else if (word == "cancel")
+    end = &ZEPDlgDriver::Cancel;
+  else if (word == "reject" || word == "close")
+    end = &ZEPDlgDriver::Reject;
+  else if (word != "open")
+    return BadValue(iControl, Quoted(iText) + " is not something to do with its dialog");
+  const std::vector<ZEPVidFraWindow*> before = ZEPVidFraWindow::Windows();
+  ZEPCheckLog::Clear();
+  if (!ZEPDlgDriver::Click(iControl.inner)) return Refused(iControl);
+  ZEPVidFraDialog* dialog = ShownNewerDialog(before);
+  if (!dialog) {
+    std::string why = "the dialog of " + Quoted(iControl.Title()) + " could not be opened";
+    if (ZEPCheckLog::Count()) why += " (" + ZEPCheckLog::Entries().back().expression + ")";
+    return Fail(kExitFailure, why);
+  }
+  ZEPAppOutcome out;
+  out.message = iControl.Title() + ": the dialog opened";
+  if (auto* panel = ZEPSysDynamicCast<ZEPDbsManageCustomListVID>(dialog->GetApplicativeWidget())) {
+    out.message += " with the lists";
+    for (const std::string& list : panel->GetLists())
+      out.message += " " + Quoted(list);
+  }
+  if (auto* legend = ZEPSysDynamicCast<ZEPDbsLegendTableLayoutVID>(dialog))
+    out.message += " for " + Quoted(legend->GetContext());
+  if (!end) return out;
+  if (!end(dialog)) return Refused(iControl);
+  ZEPDlgDriver::Idle();
+  const bool ended = ShownNewerDialog(before) == nullptr;
+  out.message += std::string(", was ") +
+                 (end == &ZEPDlgDriver::Accept   ? "accepted"
+                  : end == &ZEPDlgDriver::Cancel ? "cancelled"
+                                                 : "rejected") +
+                 (ended ? " and closed" : " but is still open");
+  if (!ended) out.code = kExitFailure;
+  return out;
+}
+
 } // namespace
 
 ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls,
@@ -606,6 +728,19 @@ ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls,
   }
   case ZEPAppKind::Combo: {
     const ZEPDlgCombo* combo = PickableCombo(iControl.inner);
+    unsigned int rgb[3] = {0, 0, 0};
+    if (ZEPSysDynamicCast<ZEPComboColor>(iControl.inner) && ParseColor(iText, rgb)) {
+      if (rgb[0] > 255 || rgb[1] > 255 || rgb[2] > 255)
+        return BadValue(iControl, Quoted(iText) + " has a component above 255");
+      unsigned int shown[3] = {0, 0, 0};
+      if (ZEPSysDynamicCast<ZEPComboColor>(iControl.inner)
+                  ->GetSelectedColor(&shown[0], &shown[1], &shown[2]) &&
+          std::equal(rgb, rgb + 3, shown))
+        return Done(iControl, false);
+      if (!ZEPDlgDriver::SelectColor(iControl.inner, rgb[0], rgb[1], rgb[2]))
+        return Refused(iControl);
+      return Done(iControl, true);
+    }
     const int line = FindLine(Lines(*combo), iText);
     if (line < 0) return BadValue(iControl, Quoted(iText) + " is not one of its lines");
     if (line == combo->GetSelect()) return Done(iControl, false);
@@ -624,6 +759,8 @@ ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls,
     return Done(iControl, true);
   }
   case ZEPAppKind::Push:
+    if (iControl.opensNewerDialog) return OperateNewerDialog(iControl, iText);
+    break;
   case ZEPAppKind::Other:
     break;
   }

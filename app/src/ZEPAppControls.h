@@ -35,6 +35,7 @@ struct ZEPAppControl {
   std::string section;                   // title of its section
   ZEPDialog* subDialog = nullptr;        // the sub-dialog it is in; null on the page itself
   ZEPDialog* opener = nullptr;           // the push button that opened that sub-dialog
+  bool opensNewerDialog = false;         // a button whose dialog is of the newer framework
 
   ZEPAppKind Kind() const;
   std::string Title() const;

@@ -2,6 +2,8 @@
 
 #include "ZEP2DBaseOptDimFrm.h"
 #include "ZEP2DBaseOptAdminFrm.h"
+#include "ZEP2DBaseOptAnnotFrm.h"
+#include "ZEP2DBaseOptDisplayFrm.h"
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
@@ -123,6 +125,77 @@ private:
   ZEPAppBinding _binding{"Administration"};
 };
 
+// The annotation page bound to a table: "Annotation" for its annotation layout, "Callout" for
+// its callout layout, which the info status of the callout size overrun selects.
+class AnnotationPage : public ZEP2DBaseOptAnnotFrm {
+public:
+  AnnotationPage(ZEPDialog* iParent, const char* iTable, bool iCalloutLayout)
+      : ZEP2DBaseOptAnnotFrm(iParent, "AnnotationPage"), _calloutLayout(iCalloutLayout),
+        _binding(iTable) {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)
+#include "ZEP2DBaseOptAnnotFrm.def"
+#undef ZEP_SETTING
+  ZEPString GetLegendTableLayoutContext() override { return "DrwLegendTable"; }
+
+  bool _calloutLayout;
+
+private:
+  ZEPAppBinding _binding;
+};
+
+// Answers the callout info hook with its lock record and a status that picks the layout.
+class AnnotationLayoutPage : public AnnotationPage {
+public:
+  AnnotationLayoutPage(ZEPDialog* iParent, const char* iTable, bool iCalloutLayout)
+      : AnnotationPage(iParent, iTable, iCalloutLayout) {}
+
+protected:
+  long GetSysCalloutSizeOverrunInfo(ZEPSettingInfo& oInfo) override {
+    AnnotationPage::GetSysCalloutSizeOverrunInfo(oInfo);
+    return _calloutLayout ? S_OK : 1; // a success, but not the callout host's exact 0
+  }
+};
+
+ZEPDlgFrame* OpenAnnotation(ZEPDialog* iParent) {
+  auto* page = new AnnotationLayoutPage(iParent, "Annotation", false);
+  page->Build();
+  page->Initialize();
+  return page;
+}
+
+ZEPDlgFrame* OpenCallouts(ZEPDialog* iParent) {
+  auto* page = new AnnotationLayoutPage(iParent, "Callout", true);
+  page->Build();
+  page->Initialize();
+  return page;
+}
+
+// The display page with every optional frame.
+class DisplayPage : public ZEP2DBaseOptDisplayFrm {
+public:
+  explicit DisplayPage(ZEPDialog* iParent) : ZEP2DBaseOptDisplayFrm(iParent, "DisplayPage") {}
+  void Build() {
+    int row = 0;
+    ZEP2DBaseOptDisplayFrm::Build(row, 1);
+  }
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)
+#include "ZEP2DBaseOptDisplayFrm.def"
+#undef ZEP_SETTING
+  unsigned char WithFrmVisualization() override { return 1; }
+  unsigned char WithFrmGeometries() override { return 1; }
+  unsigned char WithFrmCallouts() override { return 1; }
+  unsigned char WithFrmWelding() override { return 1; }
+  unsigned char WithFrmPatterns() override { return 1; }
+  unsigned char WithFrmCapping() override { return 1; }
+
+private:
+  ZEPAppBinding _binding{"Display"};
+};
+
 template <class Page> ZEPDlgFrame* Open(ZEPDialog* iParent) {
   auto* page = new Page(iParent);
   page->Build();
@@ -151,6 +224,12 @@ const std::map<std::string, ZEPAppStored> kManipulatorsStored = {
 };
 const std::map<std::string, ZEPAppStored> kAdministrationStored = {
 #include "ZEP2DBaseOptAdminFrm.def"
+};
+const std::map<std::string, ZEPAppStored> kAnnotationStored = {
+#include "ZEP2DBaseOptAnnotFrm.def"
+};
+const std::map<std::string, ZEPAppStored> kDisplayStored = {
+#include "ZEP2DBaseOptDisplayFrm.def"
 };
 #undef ZEP_SETTING
 
@@ -187,6 +266,12 @@ const std::set<std::string> kManipulatorsFlags = {
 const std::set<std::string> kAdministrationFlags = {
 #include "ZEP2DBaseOptAdminFrm.def"
 };
+const std::set<std::string> kAnnotationFlags = {
+#include "ZEP2DBaseOptAnnotFrm.def"
+};
+const std::set<std::string> kDisplayFlags = {
+#include "ZEP2DBaseOptDisplayFrm.def"
+};
 #undef ZEP_SETTING
 
 // Settings whose control a page builds only when an environment variable is set.
@@ -212,6 +297,10 @@ const std::vector<ZEPAppPage>& AppPages() {
        kManipulatorsFlags},
       {"administration", "Administration", "Administration", &Open<AdministrationPage>, kAdministrationStored,
        {"pushPropTbBehavior"}, {}, kAdministrationFlags},
+      {"annotation", "Annotation", "Annotation", &OpenAnnotation, kAnnotationStored, {}, {}, kAnnotationFlags},
+      {"callouts", "Callouts", "Callout", &OpenCallouts, kAnnotationStored, {}, {}, kAnnotationFlags},
+      {"display", "Display", "Display", &Open<DisplayPage>, kDisplayStored,
+       {"diagElementsColorsPushButton", "diagGeometriesColorsPushButton"}, {}, kDisplayFlags},
       // clang-format on
   };
   return pages;

@@ -1,5 +1,6 @@
 #include "ZEPAppRender.h"
 
+#include <cstdio>
 #include <sstream>
 
 namespace zepapp {
@@ -104,6 +105,9 @@ a.push{color:inherit;text-decoration:none;cursor:pointer}
 .subbox{min-width:320px;max-width:92vw;max-height:92vh;overflow:auto;background:#eceef1;border:1px solid #2f3b4c;border-radius:6px;box-shadow:0 10px 30px rgba(0,0,0,.45)}
 .subbox .pagegrid{padding:10px 14px}
 .titlebar a.close{color:#fff;text-decoration:none}
+.colour{display:inline-flex;align-items:center;gap:4px}
+.swatch{display:inline-block;width:14px;height:14px;border:1px solid #7a8390;border-radius:2px}
+.disabled .swatch{opacity:.45}
 @media print{.page{display:block;margin-bottom:18px}.tabs{display:none}body{background:#fff}}
 )CSS";
 
@@ -224,6 +228,30 @@ void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out)
     out += "<span" + Attributes(w, "spinner", tip) + "><span class=\"value\">" +
            EscapeHtml(spinner->FormatValue(spinner->GetValue())) +
            "</span><span class=\"arrows\"><span>&#9650;</span><span>&#9660;</span></span></span>";
+    return;
+  }
+  if (auto* colour = ZEPSysDynamicCast<ZEPComboColor>(self)) {
+    // The selected colour as a swatch before the combo's line.
+    unsigned int rgb[3] = {0, 0, 0};
+    char hex[8] = "";
+    if (colour->GetSelectedColor(&rgb[0], &rgb[1], &rgb[2]))
+      std::snprintf(hex, sizeof hex, "#%02X%02X%02X", rgb[0] & 0xFF, rgb[1] & 0xFF, rgb[2] & 0xFF);
+    std::string tip = w.GetTitle().str();
+    if (!Tooltip(w).empty()) tip += (tip.empty() ? "" : ": ") + Tooltip(w);
+    out += "<span" + Attributes(w, "colour", tip) + ">";
+    if (*hex)
+      out += "<span class=\"swatch\" style=\"background:" + std::string(hex) + "\" title=\"" +
+             hex + "\"></span>";
+    Children(w, iPage, out);
+    out += "</span>";
+    return;
+  }
+  if (ZEPSysDynamicCast<ZEPNumberedCombo>(self)) { // line weights and the like: titled
+    std::string tip = w.GetTitle().str();
+    if (!Tooltip(w).empty()) tip += (tip.empty() ? "" : ": ") + Tooltip(w);
+    out += "<span" + Attributes(w, "numbered", tip) + ">";
+    Children(w, iPage, out);
+    out += "</span>";
     return;
   }
   if (auto* combo = ZEPSysDynamicCast<ZEPDlgCombo>(self)) {

@@ -1,0 +1,245 @@
+// Annotation page: its two layouts, the area fill radios, the callout size overrun, and the two
+// dialogs of the newer dialog framework opened, ended every way, and outlived by their events.
+#include "RecordingPages.h"
+
+namespace {
+class AnnotPage : public ZEPHostTest {
+protected:
+  void SetUp() override {
+    ZEPHostTest::SetUp();
+    ZEPSysSettingRepository::Open("DraftingOptions");
+  }
+  void Open() { _pPage = OpenPage<RecordingAnnotPage>(_script, &_root); }
+  ZEPDialog* Control(const char* iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
+  ZEPDlgRadioButton* Radio(const char* iName) {
+    return ZEPSysDynamicCast<ZEPDlgRadioButton>(Control(iName));
+  }
+  std::vector<std::string> Hooks() {
+    std::vector<std::string> out;
+    for (const HookCall& c : _script.calls)
+      out.push_back(c.hook);
+    return out;
+  }
+  // The newer dialog the page has open, if any.
+  ZEPVidFraDialog* Dialog() {
+    ZEPVidFraDialog* found = nullptr;
+    for (ZEPVidFraWindow* w : ZEPVidFraWindow::Windows())
+      if (w->GetParentCommand() == _pPage && !w->IsDestructionRequested())
+        found = ZEPSysDynamicCast<ZEPVidFraDialog>(w);
+    return found;
+  }
+  // Presses the button and answers the dialog it opened.
+  ZEPVidFraDialog* Press(const char* iButton) {
+    EXPECT_TRUE(ZEPDlgDriver::Click(Control(iButton))) << iButton;
+    return Dialog();
+  }
+  HookScript _script;
+  RecordingAnnotPage* _pPage = nullptr;
+};
+
+const char* const kButtons[] = {"pushTableSortCustomLists", "pushLegendTableLayout"};
+} // namespace
+
+TEST_F(AnnotPage, ModuleHooksBuildTheAnnotationLayout) {
+  Open();
+  for (const char* frame : {"frameAnnotCreation", "frmLegendTable", "frmTable", "frmAreaFill"})
+    EXPECT_NE(ZEPDlgDriver::Find(_pPage, frame), nullptr) << frame;
+  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "toolCalloutCreation"), nullptr);
+  EXPECT_EQ(Radio("radOptimGenAndGeo")->GetState(), ZEPDlgChecked);
+  EXPECT_TRUE(_script.calls.empty());
+  EXPECT_EQ(ZEPCheckLog::Count(), 0);
+  ExpectGolden("annot_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
+}
+
+TEST_F(AnnotPage, TheCalloutInfoStatusChoosesTheLayout) {
+  const struct {
+    long status;
+    bool callout;
+  } cases[] = {{0, true}, {1, false}, {E_FAIL, false}, {E_NOTIMPL, false}};
+  for (const auto& c : cases) {
+    _script.info = {{"CalloutSizeOverrun", c.status}};
+    auto* window = new ZEPDlgWindow(&_root, "window", 0);
+    _pPage = OpenPage<RecordingAnnotPage>(_script, window);
+    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "toolCalloutCreation") != nullptr, c.callout) << c.status;
+    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "frmTable") != nullptr, !c.callout) << c.status;
+    EXPECT_NE(ZEPDlgDriver::Find(_pPage, "pushLegendTableLayout"), nullptr);
+    delete window;
+  }
+  _script.info.clear();
+  _script.allInfoSet = true; // every info hook answers 0: the callout layout
+  Open();
+  ExpectGolden("annot_page_info_zero.dump", ZEPDlgDriver::Dump(_pPage));
+}
+
+TEST_F(AnnotPage, CalloutSizeOverrunIsAPaperLengthWrittenOnlyByTheUser) {
+  _script.info = {{"CalloutSizeOverrun", 0}};
+  _script.values = {{"CalloutSizeOverrun", {2.5}}, {"EnableCreateCallout", {1}}};
+  Open();
+  auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(Control("edtCalloutSizeOverrun"));
+  EXPECT_DOUBLE_EQ(spinner->GetValue(), 0.0025);
+  EXPECT_TRUE(_script.calls.empty()) << "opening the page writes nothing";
+  ASSERT_TRUE(ZEPDlgDriver::Enter(spinner, 0.004));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkEnableCreateCallout")));
+  ASSERT_EQ(Hooks(),
+            (std::vector<std::string>{"SetSysCalloutSizeOverrun", "SetSysEnableCreateCallout"}));
+  EXPECT_DOUBLE_EQ(_script.calls[0].values[0], 4.0);
+  EXPECT_EQ(_script.calls[1].values[0], 0.0);
+}
+
+TEST_F(AnnotPage, EveryCheckWritesItsOwnAttribute) {
+  const char* const checks[][2] = {{"TextSnappingOn", "TextAlongRef"},
+                                   {"TextLeadSnappingOn", "LeaderTextNormal"},
+                                   {"GDTSnappingOn", "LeaderGDTNormal"},
+                                   {"chkTableResize", "RecomputeTable"},
+                                   {"chkTableAutoSplit", "PreventTableSplit"},
+                                   {"chkAskForDelSupport", "AskForDelSupport"},
+                                   {"checkTextRigidPosLink", "TextRigidPosLink"},
+                                   {"checkTableRigidPosLink", "TableRigidPosLink"},
+                                   {"checkGDTRigidPosLink", "GDTRigidPosLink"}};
+  for (const auto& c : checks)
+    _script.values[c[1]] = {1};
+  Open();
+  for (const auto& c : checks) {
+    _script.calls.clear();
+    auto* check = ZEPSysDynamicCast<ZEPDlgCheckButton>(Control(c[0]));
+    EXPECT_EQ(check->GetState(), ZEPDlgChecked) << c[0];
+    ASSERT_TRUE(ZEPDlgDriver::Click(check));
+    ASSERT_EQ(Hooks(), std::vector<std::string>{std::string("SetSys") + c[1]});
+    EXPECT_EQ(_script.calls[0].values[0], 0.0);
+  }
+}
+
+TEST_F(AnnotPage, AreaFillRadiosWriteOncePerChange) {
+  for (double stored : {2.0, 1.0}) {
+    _script.values = {{"AreaFillOptimizationMode", {stored}}};
+    auto* window = new ZEPDlgWindow(&_root, "window", 0);
+    _pPage = OpenPage<RecordingAnnotPage>(_script, window);
+    EXPECT_EQ(Radio("radOptimImport")->GetState(), stored == 1.0 ? ZEPDlgChecked : ZEPDlgUnchecked);
+    EXPECT_EQ(Radio("radOptimGenAndGeo")->GetState(), ZEPDlgUnchecked) << stored;
+    delete window;
+  }
+  _script.values.clear();
+  Open();
+  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radOptimGenAndGeo"))); // already on
+  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radOptimImport")));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radOptimGenAndGeo")));
+  ASSERT_EQ(Hooks(), std::vector<std::string>(2, "SetSysAreaFillOptimizationMode"));
+  EXPECT_EQ(_script.calls[0].values[0], 1.0);
+  EXPECT_EQ(_script.calls[1].values[0], 0.0);
+}
+
+TEST_F(AnnotPage, EachDialogOpensOnceAndEveryEndingFreesBothButtons) {
+  _script.texts["LegendContext"] = "SheetLegend";
+  const struct {
+    const char* button;
+    bool (*end)(ZEPVidFraDialog*);
+  } cases[] = {{kButtons[0], &ZEPDlgDriver::Accept}, {kButtons[0], &ZEPDlgDriver::Cancel},
+               {kButtons[0], &ZEPDlgDriver::Reject}, {kButtons[1], &ZEPDlgDriver::Accept},
+               {kButtons[1], &ZEPDlgDriver::Cancel}, {kButtons[1], &ZEPDlgDriver::Reject}};
+  Open();
+  for (const auto& c : cases) {
+    ZEPVidFraDialog* dialog = Press(c.button);
+    ASSERT_NE(dialog, nullptr) << c.button;
+    EXPECT_TRUE(dialog->IsVisible());
+    EXPECT_EQ(dialog->GetLifeCycle(), 2);
+    if (auto* legend = ZEPSysDynamicCast<ZEPDbsLegendTableLayoutVID>(dialog))
+      EXPECT_EQ(legend->GetContext(), "SheetLegend");
+    else
+      EXPECT_TRUE(
+          ZEPSysDynamicCast<ZEPDbsManageCustomListVID>(dialog->GetApplicativeWidget())->IsBuilt());
+    // While it is open, neither button opens anything.
+    for (const char* other : kButtons)
+      EXPECT_EQ(Press(other), dialog);
+    EXPECT_EQ(ZEPCheckLog::Count(), 2);
+    EXPECT_TRUE(ZEPCheckLog::Contains("!_pFraDialog"));
+    ZEPCheckLog::Clear();
+    ASSERT_TRUE(c.end(dialog));
+    EXPECT_FALSE(dialog->IsVisible());
+    EXPECT_EQ(Dialog(), nullptr);
+    EXPECT_FALSE(c.end(dialog)) << "an ending dialog takes no more clicks";
+    ZEPDlgDriver::Idle();
+    EXPECT_EQ(ZEPVidFraWindow::Windows().size(), 0u);
+    EXPECT_EQ(ZEPCheckLog::Count(), 0) << c.button;
+  }
+  EXPECT_TRUE(_script.calls.empty());
+}
+
+TEST_F(AnnotPage, EventsAfterThePageIsGoneDoNothing) {
+  for (const char* button : kButtons) {
+    auto* window = new ZEPDlgWindow(&_root, "window", 0);
+    _pPage = OpenPage<RecordingAnnotPage>(_script, window);
+    ZEPVidFraDialog* dialog = Press(button);
+    ASSERT_NE(dialog, nullptr);
+    delete window; // the page goes with its dialog still open
+    // The host still has the dialog until idle time; its events find no page.
+    ZEPSYPEventArgs args;
+    dialog->Raise(ZEPVidFraDialog::RejectButtonClicked(), &args);
+    dialog->Raise(ZEPVidFraWindow::Closed(), &args);
+    if (ZEPVidWidget* panel = dialog->GetApplicativeWidget())
+      panel->Raise(ZEPDbsManageCustomListVID::AcceptBtnPressed(), &args);
+    EXPECT_FALSE(args.IsConsumed());
+    EXPECT_EQ(ZEPCheckLog::Count(), 0);
+    ZEPDlgDriver::Idle();
+    EXPECT_TRUE(ZEPVidFraWindow::Windows().empty()) << "the page let its dialog go";
+  }
+}
+
+TEST_F(AnnotPage, CloseEventWithoutArgumentsStillReleasesTheDialog) {
+  Open();
+  ZEPVidSetup::SetEventsWithoutArgs(true);
+  for (const char* button : kButtons) {
+    ZEPVidFraDialog* dialog = Press(button);
+    ASSERT_NE(dialog, nullptr);
+    ASSERT_TRUE(ZEPDlgDriver::Reject(dialog));
+    EXPECT_TRUE(ZEPCheckLog::Contains("ipArgs"));
+    EXPECT_TRUE(dialog->IsDestructionRequested());
+    EXPECT_FALSE(dialog->IsVisible());
+    ZEPCheckLog::Clear();
+  }
+  // Custom lists end through their own buttons too.
+  for (bool (*end)(ZEPVidFraDialog*) : {&ZEPDlgDriver::Accept, &ZEPDlgDriver::Cancel}) {
+    ZEPVidFraDialog* dialog = Press(kButtons[0]);
+    ASSERT_NE(dialog, nullptr);
+    ASSERT_TRUE(end(dialog));
+    EXPECT_EQ(ZEPCheckLog::Entries().size(), 1u);
+    EXPECT_TRUE(ZEPCheckLog::Contains("ipArgs"));
+    EXPECT_EQ(Dialog(), nullptr);
+    ZEPCheckLog::Clear();
+  }
+}
+
+TEST_F(AnnotPage, HostFailuresAreReportedAndLeaveTheButtonsWorking) {
+  const struct {
+    void (*setup)(bool);
+    const char* button;
+    const char* reported;
+  } cases[] = {{&ZEPVidSetup::SetCustomListFactoryFails, kButtons[0], "_pFraDialog"},
+               {&ZEPVidSetup::SetLegendFactoryFails, kButtons[1], "_pFraDialog"},
+               {&ZEPVidSetup::SetCustomListContentIsNotPanel, kButtons[0], "pPanel"}};
+  Open();
+  for (const auto& c : cases) {
+    c.setup(true);
+    EXPECT_EQ(Press(c.button), nullptr);
+    ASSERT_EQ(ZEPCheckLog::Count(), 1);
+    EXPECT_EQ(ZEPCheckLog::Entries()[0].expression, c.reported);
+    EXPECT_EQ(ZEPCheckLog::Entries()[0].path,
+              "DraftingBaseSettings/ZEPDbsBaseSettings.m/src/ZEP2DBaseOptAnnotFrm");
+    ZEPCheckLog::Clear();
+    c.setup(false);
+    ZEPDlgDriver::Idle();
+    EXPECT_TRUE(ZEPVidFraWindow::Windows().empty()) << "nothing kept of the failed opening";
+    ZEPVidFraDialog* dialog = Press(c.button);
+    ASSERT_NE(dialog, nullptr) << "a later press works";
+    ASSERT_TRUE(ZEPDlgDriver::Reject(dialog));
+    EXPECT_EQ(ZEPCheckLog::Count(), 0);
+  }
+}
+
+TEST_F(AnnotPage, NotifPushWithoutSenderIsReported) {
+  Open();
+  ZEPDialog* push = Control(kButtons[0]);
+  push->DeliverAs(ZEPSysDynamicCast<ZEPDlgPushButton>(push)->GetPushBActivateNotification(),
+                  nullptr);
+  EXPECT_TRUE(ZEPCheckLog::Contains("iFrom"));
+  EXPECT_EQ(Dialog(), nullptr);
+}

@@ -1,0 +1,377 @@
+// Display page: sections on both sides of each layout predicate, optional controls on both sides
+// of "exactly 0", the radio pairs, the capping frame's padlocks, and the analysis display and
+// diagnosis colour dialogs row by row.
+#include "RecordingPages.h"
+
+namespace {
+// The analysed states, in dialog order.
+const char* const kStates[] = {"AnnotDelGeom",
+                               "AnnotUnloadGeom",
+                               "AnnotInvalid",
+                               "DimNotUpToDate",
+                               "DimNonAssoc",
+                               "DimIsolated",
+                               "DimBroken",
+                               "DimFake",
+                               "DimDriving",
+                               "Dim3DCst",
+                               "TechFeatDim",
+                               "DimTrue",
+                               "DimOnNonVisGeom",
+                               "DimClipped",
+                               "FilterGeneratedElements",
+                               "CalloutLastUpdateFailed",
+                               "IsolatedCallout",
+                               "NotPerpendicularCallout",
+                               "DrwWeldNotUpToDate"};
+const char* const kDiagColors[] = {"OverConsElts", "InconsElts", "NotChanElts", "IsoConsElts"};
+
+class DisplayPage : public ZEPHostTest {
+protected:
+  void SetUp() override {
+    ZEPHostTest::SetUp();
+    ZEPSysSettingRepository::Open("DraftingOptions");
+  }
+  void Open() { _pPage = OpenPage<RecordingDisplayPage>(_script, &_root); }
+  // Opens the page on a window of its own, which the caller deletes.
+  ZEPDlgWindow* OpenOnWindow() {
+    auto* window = new ZEPDlgWindow(&_root, "window", 0);
+    _pPage = OpenPage<RecordingDisplayPage>(_script, window);
+    return window;
+  }
+  ZEPDialog* Find(const std::string& iName) { return ZEPDlgDriver::Find(_pPage, iName); }
+  ZEPDialog* Control(const std::string& iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
+  ZEPDlgDialog* OpenDialog(const char* iButton, const char* iDialog) {
+    EXPECT_TRUE(ZEPDlgDriver::Click(Control(iButton))) << iButton;
+    return ZEPSysDynamicCast<ZEPDlgDialog>(Find(iDialog));
+  }
+  ZEPDlgDialog* AnalysisDialog() {
+    return OpenDialog("diagElementsColorsPushButton", "dlgAnalysisDisplay");
+  }
+  ZEPDlgDialog* DiagDialog() {
+    return OpenDialog("diagGeometriesColorsPushButton", "dlgVisuDiagColor");
+  }
+  bool Checked(const std::string& iName) {
+    auto* check = ZEPSysDynamicCast<ZEPDlgCheckButton>(Control(iName));
+    auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(Control(iName));
+    return check ? check->GetState() == ZEPDlgChecked : radio->GetState() == ZEPDlgChecked;
+  }
+  std::vector<std::string> Hooks() {
+    std::vector<std::string> out;
+    for (const HookCall& c : _script.calls)
+      out.push_back(c.hook);
+    return out;
+  }
+  HookScript _script;
+  RecordingDisplayPage* _pPage = nullptr;
+};
+} // namespace
+
+TEST_F(DisplayPage, ModuleHooksBuildOnlyTheControlsThatNeedNoAnswer) {
+  _script.options["FirstRow"] = 3;
+  Open();
+  EXPECT_EQ(_pPage->nextRow, 7);
+  EXPECT_EQ(Find("frameTree")->GetGridConstraints().row, 3);
+  for (const char* absent : {"checkTrackHistory", "checkParameters", "checkHideIn3DStatus",
+                             "checkAnnotInSpecTreeAnnotSet", "invLock1", "checkVisualizationDiag",
+                             "diagGeometriesColorsPushButton"})
+    EXPECT_EQ(Find(absent), nullptr) << absent;
+  for (const char* present : {"labelDisplay", "invLock", "checkDesignMode", "chkPropagateHighlight",
+                              "radCappingPatternMaterial", "cmbCappingColor"})
+    EXPECT_NE(Find(present), nullptr) << present;
+  EXPECT_FALSE(Control("diagElementsColorsPushButton")->IsEffectivelyEnabled());
+  EXPECT_EQ(_script.reads.size(), 69u);
+  EXPECT_TRUE(_script.calls.empty());
+  ExpectGolden("display_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
+}
+
+TEST_F(DisplayPage, InfoZeroHostWithBothDialogsOpen) {
+  _script.allInfoSet = true;
+  _script.values = {{"DimAnalysisDisplay", {1}},
+                    {"VisuDiagnostic", {1}},
+                    {"DimDriving", {1}},
+                    {"DimDrivingColor", {255, 0, 0}},
+                    {"AnnotInSpecTreePlane", {1}},
+                    {"PatternContourPitch", {1}},
+                    {"PatternContourPitchThickness", {3}},
+                    {"OverConsElts", {255, 0, 255}},
+                    {"CappingColor", {0, 128, 0}},
+                    {"BackgroundInViewFrameMode", {2}}};
+  Open();
+  std::string dump = ZEPDlgDriver::Dump(_pPage);
+  dump += ZEPDlgDriver::Dump(AnalysisDialog());
+  dump += ZEPDlgDriver::Dump(DiagDialog());
+  EXPECT_EQ(ZEPCheckLog::Count(), 0);
+  ExpectGolden("display_page_info_zero.dump", dump);
+}
+
+TEST_F(DisplayPage, EachPredicateDecidesItsFrame) {
+  _script.allInfoSet = true;
+  _script.values = {{"DimAnalysisDisplay", {1}}};
+  const struct {
+    const char* predicate;
+    const char* frame;
+    bool inDialog;
+  } cases[] = {{"WithFrmVisualization", "frameVisulization", false},
+               {"WithFrmCapping", "frmCappingProperties", false},
+               {"WithFrmGeometries", "frameGeometries", true},
+               {"WithFrmCallouts", "frameCallouts", true},
+               {"WithFrmWelding", "frameWelding", true},
+               {"WithFrmPatterns", "framePatterns", true}};
+  for (const auto& c : cases)
+    for (long with : {0, 1}) {
+      _script.options = {{c.predicate, with}};
+      ZEPDlgWindow* window = OpenOnWindow();
+      if (c.inDialog) AnalysisDialog();
+      EXPECT_EQ(Find(c.frame) != nullptr, with == 1) << c.predicate;
+      EXPECT_EQ(_pPage->nextRow, c.inDialog || with ? 4 : 3) << c.predicate;
+      delete window;
+    }
+  // Without the capping frame its values are still read.
+  _script.options = {{"WithFrmCapping", 0}, {"WithFrmVisualization", 0}, {"WithFrmPatterns", 0}};
+  _script.reads.clear();
+  Open();
+  EXPECT_EQ(_pPage->nextRow, 2);
+  EXPECT_EQ(_script.reads.size(), 69u);
+  EXPECT_EQ(Find("chkPatternContourPitch"), nullptr);
+}
+
+TEST_F(DisplayPage, OptionalControlsNeedExactlyZero) {
+  const struct {
+    const char* attribute;
+    const char* control;
+    const char* button; // the dialog it is in; null on the page
+  } cases[] = {{"TrackHistory", "checkTrackHistory", nullptr},
+               {"Ditto", "checkDitto", nullptr},
+               {"AnnotInSpecTreeAnnotSet", "checkAnnotInSpecTreeAnnotSet", nullptr},
+               {"VisuDiagnostic", "diagGeometriesColorsPushButton", nullptr},
+               {"DimClipped", "chkDimClipped", "diagElementsColorsPushButton"},
+               {"IsoConsElts", "cmbIsoConsElts", "diagGeometriesColorsPushButton"}};
+  for (const auto& c : cases)
+    for (long status : {0L, 1L, E_NOTIMPL}) {
+      _script.info = {{c.attribute, status}, {"VisuDiagnostic", 0}};
+      _script.values = {{"DimAnalysisDisplay", {1}}, {"VisuDiagnostic", {1}}};
+      ZEPDlgWindow* window = OpenOnWindow();
+      if (c.button && Control(c.button)) ZEPDlgDriver::Click(Control(c.button));
+      EXPECT_EQ(Find(c.control) != nullptr, status == 0) << c.control << " " << status;
+      delete window;
+    }
+  // Without the flag of the caller the track history check is never built.
+  _script.info = {{"TrackHistory", 0}};
+  _script.options = {{"WithTrackHistory", 0}};
+  Open();
+  EXPECT_EQ(Find("checkTrackHistory"), nullptr);
+  EXPECT_EQ(Find("labelDisplay")->GetGridConstraints().row, 0);
+}
+
+TEST_F(DisplayPage, TreeRowsStayCompact) {
+  _script.info = {{"Relations", 0}, {"HideIn3DStatus", 0}, {"Ditto", 0}};
+  Open();
+  EXPECT_EQ(Find("checkRelations")->GetGridConstraints().row,
+            Find("invLock")->GetGridConstraints().row);
+  const ZEPDialog::Cell& hide = Find("checkHideIn3DStatus")->GetGridConstraints();
+  EXPECT_EQ(hide.row, Find("checkRelations")->GetGridConstraints().row);
+  EXPECT_EQ(hide.column, 3);
+  EXPECT_EQ(Find("checkDitto")->GetGridConstraints().row, hide.row + 1);
+  // Nothing before it: the row of "labelDisplay".
+  _script.info = {{"HideIn3DStatus", 0}};
+  ZEPDlgWindow* window = OpenOnWindow();
+  EXPECT_EQ(Find("checkHideIn3DStatus")->GetGridConstraints().row,
+            Find("labelDisplay")->GetGridConstraints().row);
+  delete window;
+}
+
+TEST_F(DisplayPage, PageChecksAndTheirDependants) {
+  _script.allInfoSet = true;
+  _script.values = {{"AnnotInSpecTreePlane", {1}}, {"AnnotInSpecTreeAnnotSet", {1}}};
+  Open();
+  const struct {
+    const char* check;
+    const char* dependant;
+  } cases[] = {{"checkAnnotInSpecTreePlane", "checkAnnotInSpecTreeAnnotSet"},
+               {"checkDesignMode", "diagElementsColorsPushButton"},
+               {"checkVisualizationDiag", "diagGeometriesColorsPushButton"},
+               {"chkBackgroundInViewFrame", "radBackgroundInViewFrameDemand"}};
+  for (const auto& c : cases) {
+    const bool on = Checked(c.check);
+    EXPECT_EQ(Control(c.dependant)->IsEffectivelyEnabled(), on) << c.dependant;
+    ASSERT_TRUE(ZEPDlgDriver::Click(Control(c.check)));
+    EXPECT_EQ(Control(c.dependant)->IsEffectivelyEnabled(), !on) << c.dependant;
+  }
+  EXPECT_TRUE(Checked("checkAnnotInSpecTreeAnnotSet")) << "disabled, its value kept";
+  EXPECT_EQ(Hooks(),
+            (std::vector<std::string>{"SetSysAnnotInSpecTreePlane", "SetSysDimAnalysisDisplay",
+                                      "SetSysVisuDiagnostic", "SetSysBackgroundInViewFrame"}));
+}
+
+TEST_F(DisplayPage, RadioPairsShowTheirValueAndWriteOncePerChange) {
+  const struct {
+    const char* attribute;
+    const char* first;  // written as firstValue
+    const char* second; // written as secondValue
+    double firstValue, secondValue;
+    double shownSecond; // the stored value that selects the second radio
+  } cases[] = {{"BackgroundInViewFrameMode", "radBackgroundInViewFrameAuto",
+                "radBackgroundInViewFrameDemand", 1, 2, 2},
+               {"CappingBackground", "radCappingColorFix", "radCappingColorFromFace", 0, 1, 1},
+               {"CappingPattern", "radCappingPatternNone", "radCappingPatternMaterial", 0, 1, 1}};
+  for (const auto& c : cases)
+    for (double stored : {0.0, 1.0, 2.0, 7.0}) {
+      _script.values = {{"BackgroundInViewFrame", {1}}, {c.attribute, {stored}}};
+      _script.calls.clear();
+      ZEPDlgWindow* window = OpenOnWindow();
+      const bool second = stored == c.shownSecond;
+      EXPECT_EQ(Checked(c.second), second) << c.attribute << stored;
+      EXPECT_EQ(Checked(c.first), !second) << c.attribute << stored;
+      // Click the other radio, the one already on, and back: two writes.
+      const char* other = second ? c.first : c.second;
+      ASSERT_TRUE(ZEPDlgDriver::Click(Control(other)));
+      ASSERT_TRUE(ZEPDlgDriver::Click(Control(other)));
+      ASSERT_TRUE(ZEPDlgDriver::Click(Control(second ? c.second : c.first)));
+      std::vector<double> written;
+      for (const HookCall& call : _script.calls)
+        written.push_back(call.values[0]);
+      const double toOther = second ? c.firstValue : c.secondValue;
+      const double back = second ? c.secondValue : c.firstValue;
+      // Coming back to a stored value the radios do not show (7) writes what they show.
+      if (stored == toOther)
+        EXPECT_EQ(written, std::vector<double>{back}) << c.attribute << stored;
+      else
+        EXPECT_EQ(written, (std::vector<double>{toOther, back})) << c.attribute << stored;
+      delete window;
+    }
+}
+
+TEST_F(DisplayPage, CappingColourFollowsTheBackgroundRadiosAndBothPadlocks) {
+  _script.allInfoSet = true;
+  _script.values = {{"CappingBackground", {2}}};
+  Open();
+  // A stored 2 shows the fixed colour radio, its combo disabled.
+  EXPECT_TRUE(Checked("radCappingColorFix"));
+  EXPECT_FALSE(Control("cmbCappingColor")->IsEffectivelyEnabled());
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("radCappingColorFromFace")));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("radCappingColorFix")));
+  EXPECT_TRUE(Control("cmbCappingColor")->IsEffectivelyEnabled());
+  EXPECT_TRUE(Control("chkCappingColorScale")->IsEffectivelyEnabled());
+  ASSERT_TRUE(ZEPDlgDriver::SelectColor(Control("cmbCappingColor"), 10, 20, 30));
+  ASSERT_EQ(Hooks(), (std::vector<std::string>{"SetSysCappingBackground", "SetSysCappingBackground",
+                                               "SetSysCappingColor"}));
+  EXPECT_EQ(_script.calls[2].values, (std::vector<double>{10, 20, 30}));
+  // Locking the background locks the colour and its scale, which sit inside its frame.
+  for (const char* lock : {"CappingBackground", "CappingColor"}) {
+    _script.locked = {lock};
+    _script.values = {{"CappingBackground", {0}}};
+    ZEPDlgWindow* window = OpenOnWindow();
+    EXPECT_FALSE(Control("cmbCappingColor")->IsEffectivelyEnabled()) << lock;
+    EXPECT_EQ(Control("chkCappingColorScale")->IsEffectivelyEnabled(),
+              std::string(lock) == "CappingColor")
+        << lock;
+    delete window;
+  }
+}
+
+TEST_F(DisplayPage, EveryAnalysedStateWritesThroughItsOwnHooks) {
+  _script.allInfoSet = true;
+  _script.values = {{"DimAnalysisDisplay", {1}}};
+  Open();
+  ZEPDlgDialog* dialog = AnalysisDialog();
+  ASSERT_NE(dialog, nullptr);
+  for (const char* state : kStates) {
+    const std::string name = state;
+    _script.calls.clear();
+    ZEPDialog* combo = ZEPDlgDriver::FindControl(dialog, "cmb" + name);
+    EXPECT_FALSE(combo->IsEffectivelyEnabled()) << name << ": state off, colour disabled";
+    ASSERT_TRUE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(dialog, "chk" + name)));
+    EXPECT_TRUE(combo->IsEffectivelyEnabled()) << name;
+    ASSERT_TRUE(ZEPDlgDriver::SelectColor(combo, 1, 2, 3));
+    ASSERT_EQ(Hooks(), (std::vector<std::string>{"SetSys" + name, "SetSys" + name + "Color"}));
+    EXPECT_EQ(_script.calls[0].values[0], 1.0);
+    EXPECT_EQ(_script.calls[1].values, (std::vector<double>{1, 2, 3}));
+  }
+  // Reopened, the dialog shows what was written.
+  ASSERT_TRUE(ZEPDlgDriver::CloseDialog(dialog));
+  ZEPDlgDriver::Idle();
+  dialog = AnalysisDialog();
+  EXPECT_TRUE(ZEPSysDynamicCast<ZEPDlgCheckButton>(ZEPDlgDriver::FindControl(dialog, "chkDimTrue"))
+                  ->GetState() == ZEPDlgChecked);
+}
+
+TEST_F(DisplayPage, StateRowsAreCompactInTheirFrame) {
+  _script.info = {{"DimDriving", 0}, {"DimTrue", 0}};
+  _script.values = {{"DimAnalysisDisplay", {1}}};
+  Open();
+  ZEPDlgDialog* dialog = AnalysisDialog();
+  EXPECT_EQ(ZEPDlgDriver::Find(dialog, "chkDimDriving")->GetGridConstraints().row, 0);
+  EXPECT_EQ(ZEPDlgDriver::Find(dialog, "cmbDimTrue")->GetGridConstraints().row, 1);
+  EXPECT_EQ(ZEPDlgDriver::Find(dialog, "chkDimFake"), nullptr);
+  // The pattern controls need no answer.
+  EXPECT_NE(ZEPDlgDriver::Find(dialog, "chkPatternContourPitch"), nullptr);
+}
+
+TEST_F(DisplayPage, PatternPitchWeightAndDiagnosisColours) {
+  _script.allInfoSet = true;
+  _script.values = {{"DimAnalysisDisplay", {1}},
+                    {"VisuDiagnostic", {1}},
+                    {"PatternContourPitchThickness", {3}},
+                    {"OverConsElts", {200, 100, 50}},
+                    {"InconsElts", {4294967295.0, 0, 0}}};
+  Open();
+  ZEPDlgDialog* analysis = AnalysisDialog();
+  auto* weight = ZEPDlgDriver::FindControl(analysis, "cmbPatternContourPitch");
+  EXPECT_EQ(ZEPSysDynamicCast<ZEPComboWeight>(weight)->GetSelect(), 3u);
+  EXPECT_FALSE(weight->IsEffectivelyEnabled());
+  ASSERT_TRUE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(analysis, "chkPatternContourPitch")));
+  ASSERT_TRUE(ZEPDlgDriver::Select(weight, 4));
+  ZEPDlgDialog* diag = DiagDialog();
+  unsigned int rgb[3] = {0, 0, 0};
+  ZEPSysDynamicCast<ZEPComboColor>(ZEPDlgDriver::FindControl(diag, "cmbOverConsElts"))
+      ->GetSelectedColor(&rgb[0], &rgb[1], &rgb[2]);
+  EXPECT_EQ(std::vector<unsigned int>(rgb, rgb + 3), (std::vector<unsigned int>{200, 100, 50}));
+  // A colour out of range is not shown: no conversion wraps it into one.
+  ZEPSysDynamicCast<ZEPComboColor>(ZEPDlgDriver::FindControl(diag, "cmbInconsElts"))
+      ->GetSelectedColor(&rgb[0], &rgb[1], &rgb[2]);
+  EXPECT_NE(std::vector<unsigned int>(rgb, rgb + 3), (std::vector<unsigned int>{255, 0, 0}));
+  for (const char* name : kDiagColors)
+    ASSERT_TRUE(ZEPDlgDriver::SelectColor(
+        ZEPDlgDriver::FindControl(diag, std::string("cmb") + name), 255, 128, 0));
+  ASSERT_EQ(_script.calls.size(), 6u);
+  EXPECT_EQ(_script.calls[1].hook, "SetSysPatternContourPitchThickness");
+  EXPECT_EQ(_script.calls[1].values[0], 5.0);
+  for (int i = 0; i < 4; ++i) {
+    EXPECT_EQ(_script.calls[2 + i].hook, std::string("SetSys") + kDiagColors[i]);
+    EXPECT_EQ(_script.calls[2 + i].values, (std::vector<double>{255, 128, 0}));
+  }
+}
+
+TEST_F(DisplayPage, DialogsOpenOnceAndLocksHoldInside) {
+  _script.allInfoSet = true;
+  _script.locked = {"DimFake", "IsoConsElts", "PatternContourPitch"};
+  _script.values = {{"DimAnalysisDisplay", {1}}, {"VisuDiagnostic", {1}}, {"DimFake", {1}}};
+  Open();
+  ZEPDlgDialog* analysis = AnalysisDialog();
+  analysis->SetVisibility(ZEPDlgHide);
+  EXPECT_EQ(AnalysisDialog(), analysis) << "a second press shows the open dialog";
+  EXPECT_EQ(analysis->GetVisibility(), ZEPDlgShow);
+  int dialogs = 0;
+  for (ZEPDialog* child : _pPage->GetChildren())
+    dialogs += ZEPSysDynamicCast<ZEPDlgDialog>(child) ? 1 : 0;
+  EXPECT_EQ(dialogs, 1);
+  // A locked state stays off-limits though ticked; its colour, not locked, follows the state.
+  EXPECT_FALSE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(analysis, "chkDimFake")));
+  EXPECT_TRUE(ZEPDlgDriver::FindControl(analysis, "cmbDimFake")->IsEffectivelyEnabled());
+  EXPECT_FALSE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(analysis, "chkPatternContourPitch")));
+  ZEPDlgDialog* diag = DiagDialog();
+  EXPECT_FALSE(
+      ZEPDlgDriver::SelectColor(ZEPDlgDriver::FindControl(diag, "cmbIsoConsElts"), 1, 1, 1));
+  EXPECT_TRUE(
+      ZEPDlgDriver::SelectColor(ZEPDlgDriver::FindControl(diag, "cmbNotChanElts"), 1, 1, 1));
+  // Disabling the button leaves the open dialog open.
+  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkDesignMode")));
+  EXPECT_TRUE(analysis->IsEffectivelyEnabled());
+  EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysNotChanElts", "SetSysDimAnalysisDisplay"}));
+  // Closing one dialog leaves the other.
+  ASSERT_TRUE(ZEPDlgDriver::Close(diag));
+  ZEPDlgDriver::Idle();
+  EXPECT_EQ(Find("dlgVisuDiagColor"), nullptr);
+  EXPECT_EQ(Find("dlgAnalysisDisplay"), analysis);
+}
