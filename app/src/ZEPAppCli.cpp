@@ -661,10 +661,11 @@ int Render(const Request& iRequest, std::ostream& out, std::ostream& err) {
       ranged = true;
       note = "Spacing and graduations of the " + ScaleName(ShownRange(controls)) + " scale range";
     }
-    ZEPAppRenderPage shown{page->name, page->title, session.Open(*page), note, {}};
+    ZEPAppRenderPage shown{page->name, page->title, session.Open(*page), note, {}, {}};
     for (const ZEPAppControl& c : controls)
       if (c.opener && (shown.dialogs.empty() || shown.dialogs.back().dialog != c.subDialog))
         shown.dialogs.push_back({c.opener, c.subDialog});
+    for (const ZEPAppControl& c : controls) shown.whyNot[c.inner] = WhyRefused(controls, c);
     rendered.push_back(shown);
   }
   if (iRequest.range && !ranged) {

@@ -1,6 +1,9 @@
 #include "ZEPAppRender.h"
 
+#include "ZEPDrwLockDialog.h"
+
 #include <cstdio>
+#include <cctype>
 #include <sstream>
 
 namespace zepapp {
@@ -53,16 +56,17 @@ std::string Padlock(bool iLocked) {
 const char* const kStyle = R"CSS(
 *{box-sizing:border-box}
 body{margin:0;padding:28px;background:#5b6e86;font:13px/1.35 "Segoe UI",Tahoma,"DejaVu Sans",Arial,sans-serif;color:#1b1b1b}
-.dialog{max-width:980px;margin:0 auto;background:#eceef1;border:1px solid #2f3b4c;border-radius:6px;box-shadow:0 10px 30px rgba(0,0,0,.35);overflow:hidden}
+.captioned{display:inline-flex;align-items:center;gap:6px}
+.dialog{max-width:980px;margin:0 auto;background:#eceef1;border:1px solid #2f3b4c;border-radius:6px;box-shadow:0 10px 30px rgba(0,0,0,.35);overflow:hidden;min-width:0}
 .titlebar{display:flex;align-items:center;gap:8px;padding:7px 12px;background:linear-gradient(#3f6fb0,#2d548c);color:#fff;font-weight:600}
 .titlebar .icon{display:inline-block;width:16px;height:16px;border-radius:3px;background:#f4c542;box-shadow:inset 0 0 0 2px #d39e12}
 .titlebar .close{margin-left:auto;width:20px;height:18px;border-radius:3px;background:#c9443a;text-align:center;line-height:17px;font-size:12px}
 .body{padding:12px 14px 4px}
-.tabs{display:flex;gap:2px;padding-left:6px;position:relative;top:1px}
+.tabs{display:flex;flex-wrap:wrap;gap:2px;padding-left:6px;position:relative;top:1px}
 .tabs label{padding:5px 14px;border:1px solid #9aa3ae;border-bottom:none;border-radius:5px 5px 0 0;background:#d8dce2;color:#333;cursor:pointer}
 .tabs label:hover{background:#e4e7eb}
 input.tab{position:absolute;opacity:0;pointer-events:none}
-.panels{border:1px solid #9aa3ae;background:#f7f8f9;border-radius:0 4px 4px 4px;padding:12px 16px 16px;min-height:260px}
+.panels{border:1px solid #9aa3ae;background:#f7f8f9;border-radius:0 4px 4px 4px;padding:12px 16px 16px;height:min(74vh,820px);min-height:260px;overflow:auto}
 .page{display:none}
 .page h2{margin:0 0 2px;font-size:15px;font-weight:600;color:#203656}
 .page .note{margin:0 0 8px;color:#56606c;font-size:12px}
@@ -98,6 +102,8 @@ fieldset.section legend{padding:0 6px;font-weight:600;color:#203656}
 .buttons span{min-width:74px;text-align:center}
 fieldset.radios{margin:0;padding:2px 8px 6px;border:1px solid #c7cdd5;border-radius:3px}
 fieldset.radios legend{padding:0 4px;color:#203656}
+.panels:has(:target) .page{display:none!important}
+.panels .page:target,.panels .page:has(:target){display:block!important}
 a.push{color:inherit;text-decoration:none;cursor:pointer}
 .push.disabled{pointer-events:none}
 .subdialog{display:none;position:fixed;inset:0;z-index:10;background:rgba(20,30,45,.35);align-items:center;justify-content:center}
@@ -111,6 +117,22 @@ a.push{color:inherit;text-decoration:none;cursor:pointer}
 @media print{.page{display:block;margin-bottom:18px}.tabs{display:none}body{background:#fff}}
 )CSS";
 
+// Long numbers grouped by thousands for reading: "100000 mm" becomes "100 000 mm" (narrow
+// no-break spaces), decimals untouched.
+std::string Grouped(const std::string& iText) {
+  std::size_t begin = iText.find_first_of("0123456789");
+  if (begin == std::string::npos) return iText;
+  std::size_t end = begin;
+  while (end < iText.size() && std::isdigit(static_cast<unsigned char>(iText[end]))) ++end;
+  if (end - begin <= 4 || (begin > 0 && iText[begin - 1] == '.')) return iText;
+  std::string digits = iText.substr(begin, end - begin), out;
+  for (std::size_t i = 0; i < digits.size(); ++i) {
+    if (i > 0 && (digits.size() - i) % 3 == 0) out += "\xE2\x80\xAF";
+    out += digits[i];
+  }
+  return iText.substr(0, begin) + out + iText.substr(end);
+}
+
 std::string CellStyle(const ZEPDialog& w) {
   const ZEPDialog::Cell& c = w.GetGridConstraints();
   if (!c.set) return "";
@@ -122,8 +144,11 @@ std::string CellStyle(const ZEPDialog& w) {
   return s.str();
 }
 
-// Class, name, tooltip and cell of an element.
-std::string Attributes(const ZEPDialog& w, std::string iClass, const std::string& iTooltip) {
+// Class, name, tooltip and cell of an element; the tooltip of a control the user cannot
+// operate says why (locked by whom and where, or which control keeps it disabled).
+std::string Attributes(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string iClass, std::string iTooltip) {
+  if (auto why = iPage.whyNot.find(&w); why != iPage.whyNot.end() && !why->second.empty())
+    iTooltip += (iTooltip.empty() ? "" : "\n") + why->second;
   const bool hidden = w.GetVisibility() == ZEPDlgHide;
   if (hidden)
     iClass += " hidden";
@@ -164,7 +189,7 @@ void RenderDialog(const ZEPAppRenderPage& iPage, const ZEPDialog& iDialog, std::
   out += "</div><div class=\"buttons\"><a class=\"push\" href=\"#\">Close</a></div></div></div>\n";
 }
 
-void RenderCombo(const ZEPDialog& w, const ZEPDlgCombo& combo, std::string& out) {
+void RenderCombo(const ZEPDialog& w, const ZEPAppRenderPage& iPage, const ZEPDlgCombo& combo, std::string& out) {
   std::string lines, selected;
   for (int i = 0; i < combo.GetLineCount(); ++i) {
     ZEPUnicodeString text;
@@ -176,8 +201,17 @@ void RenderCombo(const ZEPDialog& w, const ZEPDlgCombo& combo, std::string& out)
   std::string tip = w.GetTitle().str();
   if (!Tooltip(w).empty()) tip += (tip.empty() ? "" : ": ") + Tooltip(w);
   tip += (tip.empty() ? "" : "\n") + lines;
-  out += "<span" + Attributes(w, "combo", tip) + "><span class=\"value\">" + EscapeHtml(selected) +
+  // A combo of its own (the scale range combo) gets its caption beside it.
+  const bool captioned = !w.GetTitle().IsEmpty() && !dynamic_cast<const ZEPDrwLockDialog*>(w.GetParentDialog()) &&
+                         !ZEPSysDynamicCast<ZEPDlgFrame>(const_cast<ZEPDialog*>(&w));
+  if (captioned) {
+    const std::string cell = CellStyle(w);
+    out += "<span class=\"captioned\"" + (cell.empty() ? std::string() : " style=\"" + cell + "\"") +
+           "><span class=\"label\">" + EscapeHtml(w.GetTitle().str()) + ":</span>";
+  }
+  out += "<span" + Attributes(w, iPage, "combo", tip) + "><span class=\"value\">" + EscapeHtml(selected) +
          "</span><span class=\"drop\">&#9660;</span></span>";
+  if (captioned) out += "</span>";
 }
 
 void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out) {
@@ -188,13 +222,13 @@ void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out)
     std::string tip =
         locked ? (lock->GetLockText().empty() ? "Locked by an administrator" : lock->GetLockText())
                : "Not locked: this setting can be changed";
-    out += "<span" + Attributes(w, locked ? "padlock locked" : "padlock open", tip) +
+    out += "<span" + Attributes(w, iPage, locked ? "padlock locked" : "padlock open", tip) +
            " aria-label=\"" + (locked ? "locked" : "not locked") + "\">" + Padlock(locked) +
            "</span>";
     return;
   }
   if (auto* section = ZEPSysDynamicCast<ZEPDlgToolsOptionsFrame>(self)) {
-    out += "<fieldset" + Attributes(w, "section", "") + "><legend>" +
+    out += "<fieldset" + Attributes(w, iPage, "section", "") + "><legend>" +
            EscapeHtml(section->GetTitle().str()) + "</legend>";
     for (const ZEPDialog* child : w.GetChildren()) {
       out += "<div class=\"grid\">";
@@ -206,18 +240,18 @@ void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out)
   }
   if (auto* check = ZEPSysDynamicCast<ZEPDlgCheckButton>(self)) {
     if (w.GetVisibility() == ZEPDlgHide) { // a padlock-sized placeholder
-      out += "<span" + Attributes(w, "spacer", "") + "></span>";
+      out += "<span" + Attributes(w, iPage, "spacer", "") + "></span>";
       return;
     }
     const bool on = check->GetState() == ZEPDlgChecked;
-    out += "<span" + Attributes(w, on ? "check on" : "check", Tooltip(w)) +
+    out += "<span" + Attributes(w, iPage, on ? "check on" : "check", Tooltip(w)) +
            "><span class=\"box\">" + (on ? "&#10003;" : "") + "</span><span class=\"text\">" +
            EscapeHtml(w.GetTitle().str()) + "</span></span>";
     return;
   }
   if (auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(self)) {
     const bool on = radio->GetState() == ZEPDlgChecked;
-    out += "<span" + Attributes(w, on ? "radio on" : "radio", Tooltip(w)) +
+    out += "<span" + Attributes(w, iPage, on ? "radio on" : "radio", Tooltip(w)) +
            "><span class=\"box\"></span><span class=\"text\">" + EscapeHtml(w.GetTitle().str()) +
            "</span></span>";
     return;
@@ -225,8 +259,8 @@ void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out)
   if (auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(self)) {
     std::string tip = w.GetTitle().str();
     if (!Tooltip(w).empty()) tip += (tip.empty() ? "" : ": ") + Tooltip(w);
-    out += "<span" + Attributes(w, "spinner", tip) + "><span class=\"value\">" +
-           EscapeHtml(spinner->FormatValue(spinner->GetValue())) +
+    out += "<span" + Attributes(w, iPage, "spinner", tip) + "><span class=\"value\">" +
+           EscapeHtml(Grouped(spinner->FormatValue(spinner->GetValue()))) +
            "</span><span class=\"arrows\"><span>&#9650;</span><span>&#9660;</span></span></span>";
     return;
   }
@@ -238,7 +272,7 @@ void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out)
       std::snprintf(hex, sizeof hex, "#%02X%02X%02X", rgb[0] & 0xFF, rgb[1] & 0xFF, rgb[2] & 0xFF);
     std::string tip = w.GetTitle().str();
     if (!Tooltip(w).empty()) tip += (tip.empty() ? "" : ": ") + Tooltip(w);
-    out += "<span" + Attributes(w, "colour", tip) + ">";
+    out += "<span" + Attributes(w, iPage, "colour", tip) + ">";
     if (*hex)
       out += "<span class=\"swatch\" style=\"background:" + std::string(hex) + "\" title=\"" +
              hex + "\"></span>";
@@ -249,17 +283,17 @@ void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out)
   if (ZEPSysDynamicCast<ZEPNumberedCombo>(self)) { // line weights and the like: titled
     std::string tip = w.GetTitle().str();
     if (!Tooltip(w).empty()) tip += (tip.empty() ? "" : ": ") + Tooltip(w);
-    out += "<span" + Attributes(w, "numbered", tip) + ">";
+    out += "<span" + Attributes(w, iPage, "numbered", tip) + ">";
     Children(w, iPage, out);
     out += "</span>";
     return;
   }
   if (auto* combo = ZEPSysDynamicCast<ZEPDlgCombo>(self)) {
-    RenderCombo(w, *combo, out);
+    RenderCombo(w, iPage, *combo, out);
     return;
   }
   if (auto* editor = ZEPSysDynamicCast<ZEPDlgEditor>(self)) {
-    out += "<span" + Attributes(w, "editor", Tooltip(w)) + "><span class=\"value\">" +
+    out += "<span" + Attributes(w, iPage, "editor", Tooltip(w)) + "><span class=\"value\">" +
            EscapeHtml(editor->GetText().str()) + "</span></span>";
     return;
   }
@@ -267,15 +301,15 @@ void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out)
     for (const ZEPAppRenderDialog& d : iPage.dialogs)
       if (d.opener == &w && d.dialog) {
         out += "<a href=\"#" + EscapeHtml(DialogId(iPage, *d.dialog)) + "\"" +
-               Attributes(w, "push", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) + "</a>";
+               Attributes(w, iPage, "push", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) + "</a>";
         return;
       }
-    out += "<span" + Attributes(w, "push", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) +
+    out += "<span" + Attributes(w, iPage, "push", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) +
            "</span>";
     return;
   }
   if (ZEPSysDynamicCast<ZEPDlgLabel>(self)) {
-    out += "<span" + Attributes(w, "label", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) +
+    out += "<span" + Attributes(w, iPage, "label", Tooltip(w)) + ">" + EscapeHtml(w.GetTitle().str()) +
            "</span>";
     return;
   }
@@ -289,13 +323,13 @@ void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out)
   for (const ZEPDialog* child : w.GetChildren())
     radios = radios || ZEPSysDynamicCast<ZEPDlgRadioButton>(const_cast<ZEPDialog*>(child));
   if (radios && !w.GetTitle().IsEmpty()) { // a radio group under its caption
-    out += "<fieldset" + Attributes(w, "grid radios", Tooltip(w)) + "><legend>" +
+    out += "<fieldset" + Attributes(w, iPage, "grid radios", Tooltip(w)) + "><legend>" +
            EscapeHtml(w.GetTitle().str()) + "</legend>";
     Children(w, iPage, out);
     out += "</fieldset>";
     return;
   }
-  out += "<div" + Attributes(w, hasLock ? "lockable" : "grid", "") + ">";
+  out += "<div" + Attributes(w, iPage, hasLock ? "lockable" : "grid", "") + ">";
   Children(w, iPage, out);
   out += "</div>";
 }
@@ -312,8 +346,8 @@ std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages,
   for (const ZEPAppRenderPage& p : iPages) {
     const std::string id = EscapeHtml(p.name);
     out += "#tab-" + id + ":checked~.panels #page-" + id + "{display:block}\n";
-    out += "#tab-" + id + ":checked~.tabs label[for=tab-" + id +
-           "]{background:#f7f8f9;color:#000;font-weight:600;padding-bottom:6px}\n";
+    out += "#tab-" + id + ":checked~.tabs label[for=tab-" + id + "],.body:has(#page-" + id +
+           ":target) .tabs label[for=tab-" + id + "]{background:#f7f8f9;color:#000;font-weight:600;padding-bottom:6px}\n";
   }
   out +=
       "</style>\n</head>\n<body>\n<div class=\"dialog\" role=\"dialog\" aria-label=\"Options\">\n";

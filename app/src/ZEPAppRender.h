@@ -4,6 +4,7 @@
 
 #include "ZEPHost.h"
 
+#include <map>
 #include <string>
 #include <vector>
 
@@ -22,6 +23,8 @@ struct ZEPAppRenderPage {
   std::string note;                 // a line under the page heading; may be empty
   // Drawn as dialogs of their own that their push buttons open.
   std::vector<ZEPAppRenderDialog> dialogs;
+  // Why a control the user cannot operate is so, by its operable widget: its tooltip says it.
+  std::map<const ZEPDialog*, std::string> whyNot;
 };
 
 struct ZEPAppRenderContext {
