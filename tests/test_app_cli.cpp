@@ -623,3 +623,126 @@ TEST_F(AppCli, NewerDialogsOpenAndEndEveryWayLeavingThePageOperable) {
   EXPECT_EQ(Run({"set", "annotation", "pushTableSortCustomLists", "press"}).code, kExitBadValue);
   EXPECT_EQ(Run({"set", "callouts", "pushTableSortCustomLists", "open"}).code, kExitUsage);
 }
+
+// ---- one key per setting, the administrator's commands, JSON, round trips ------------------------
+TEST_F(AppCli, EveryKeyFormNamesTheSameSetting) {
+  for (const std::vector<std::string>& key : {std::vector<std::string>{"general", "checkViewFrame"},
+                                              std::vector<std::string>{"general.checkViewFrame"},
+                                              std::vector<std::string>{"DrwViewFrame"}}) {
+    std::vector<std::string> set = {"set"}, get = {"get"};
+    set.insert(set.end(), key.begin(), key.end());
+    get.insert(get.end(), key.begin(), key.end());
+    const bool on = Run(get).out == "on\n";
+    set.push_back(on ? "off" : "on");
+    ASSERT_EQ(Run(set).code, kExitOk) << key[0];
+    EXPECT_EQ(Stored("DraftingOptions", "DrwViewFrame"), std::vector<double>{on ? 0.0 : 1.0}) << key[0];
+  }
+  // reset, lock and unlock take every form too.
+  EXPECT_EQ(Run({"reset", "DrwViewFrame"}).code, kExitOk);
+  EXPECT_EQ(Run({"lock", "general", "cmbPaperLengthUnit"}).code, kExitOk);
+  EXPECT_EQ(Run({"set", "general.cmbPaperLengthUnit", "inch"}).code, kExitRefused);
+  EXPECT_EQ(Run({"unlock", "general.cmbPaperLengthUnit"}).code, kExitOk);
+  EXPECT_EQ(Run({"set", "DrwPaperLengthUnit", "inch"}).code, kExitOk);
+  // show names the attribute beside each control.
+  EXPECT_TRUE(std::regex_search(Run({"show", "general"}).out, std::regex(R"(checkViewFrame .* DrwViewFrame)")));
+  EXPECT_EQ(Run({"get", "general.nosuch"}).code, kExitUsage);
+  EXPECT_EQ(Run({"set", "DrwViewFrame"}).code, kExitUsage); // the value is missing
+}
+
+TEST_F(AppCli, AdministratorLocksAtAValueAndSetsDefaultsWithoutCodes) {
+  ASSERT_EQ(Run({"set", "general", "cmbPaperLengthUnit", "cm"}).code, kExitOk);
+  Result lock = Run({"lock", "general", "cmbPaperLengthUnit", "inch"});
+  ASSERT_EQ(lock.code, kExitOk) << lock.err;
+  const nlohmann::json admin = nlohmann::json::parse(ReadBytes(_admin));
+  const nlohmann::json& entry = admin["settings"]["DraftingOptions"]["DrwPaperLengthUnit"];
+  EXPECT_EQ(entry["int"], 5);
+  EXPECT_EQ(entry["locked"], true);
+  EXPECT_EQ(Stored("DraftingOptions", "DrwPaperLengthUnit"), std::vector<double>{3}) << "the user's file is left";
+  EXPECT_EQ(Run({"get", "DrwPaperLengthUnit"}).out, "Inch (in)\n");
+  // A new value for a lock, in the unit the control shows.
+  ASSERT_EQ(Run({"lock", "general.spinnerViewAxisSize", "2cm"}).code, kExitOk);
+  ASSERT_EQ(Run({"lock", "general.spinnerViewAxisSize", "3cm"}).code, kExitOk);
+  EXPECT_EQ(Run({"get", "general.spinnerViewAxisSize", "--raw"}).out, "30\n");
+  EXPECT_EQ(Run({"lock", "general.spinnerViewAxisSize", "-5cm"}).code, kExitBadValue);
+  // A default for everyone that the user may still change.
+  ASSERT_EQ(Run({"default", "general.checkViewFrame", "off"}).code, kExitOk);
+  EXPECT_EQ(Run({"get", "DrwViewFrame"}).out, "off\n");
+  EXPECT_EQ(Run({"set", "DrwViewFrame", "on"}).code, kExitOk);
+  EXPECT_EQ(Run({"default", "--remove", "DrwPaperLengthUnit"}).code, kExitFile); // locked: unlock first
+  const nlohmann::json locks = nlohmann::json::parse(Run({"locks", "--json"}).out);
+  ASSERT_EQ(locks.size(), 3u);
+  for (const auto& l : locks) {
+    const bool locked = l["attribute"] != "DrwViewFrame";
+    EXPECT_EQ(l["locked"], locked) << l.dump();
+    EXPECT_EQ(l["by"], locked ? CurrentUserName() : "") << l.dump();
+    EXPECT_FALSE(l["key"].is_null());
+  }
+  ASSERT_EQ(Run({"default", "--remove", "DrwViewFrame"}).code, kExitOk);
+  EXPECT_EQ(Run({"default", "--remove", "DrwViewFrame"}).out, "DrwViewFrame had no default; nothing changed\n");
+  EXPECT_EQ(nlohmann::json::parse(Run({"locks", "--json"}).out).size(), 2u);
+}
+
+TEST_F(AppCli, JsonOutputsDescribeEverySetting) {
+  const nlohmann::json pages = nlohmann::json::parse(Run({"pages", "--json"}).out);
+  ASSERT_EQ(pages.size(), AppPages().size());
+  const nlohmann::json grid = nlohmann::json::parse(Run({"show", "grid", "--json", "--range", "2"}).out);
+  EXPECT_EQ(grid["range"], 2);
+  bool sawDisabled = false;
+  for (const auto& c : grid["controls"]) {
+    if (c["control"] != "editorGridSpacingV") continue;
+    sawDisabled = true;
+    EXPECT_EQ(c["enabled"], false);
+    EXPECT_NE(c["whyNot"].get<std::string>().find("checkAllowDistortions"), std::string::npos);
+    EXPECT_EQ(c["attribute"], "Drw_settings_GridVPrimarySpacing");
+    EXPECT_EQ(c["stored"].size(), 5u);
+  }
+  EXPECT_TRUE(sawDisabled);
+  const nlohmann::json one = nlohmann::json::parse(Run({"get", "DrwPaperLengthUnit", "--json"}).out);
+  EXPECT_EQ(one["key"], "general.cmbPaperLengthUnit");
+  EXPECT_EQ(one["stored"], nlohmann::json::array({1}));
+  // list: every stored setting once, on its own page.
+  const nlohmann::json all = nlohmann::json::parse(Run({"list", "--json"}).out);
+  std::set<std::string> listed;
+  for (const auto& s : all) listed.insert(s["attribute"].get<std::string>());
+  EXPECT_EQ(listed.size(), all.size());
+  EXPECT_TRUE(listed.count("DrwViewFrame") && listed.count("Drw_settings_DragModeR14"));
+  EXPECT_GT(all.size(), 200u);
+}
+
+TEST_F(AppCli, WhatGetPrintsSetsBackWithoutChange) {
+  // Every spinner of every page, in each paper unit: typing back what get prints changes nothing.
+  int checked = 0;
+  for (const char* unit : {"mm", "cm", "inch"}) {
+    ASSERT_EQ(Run({"set", "general", "cmbPaperLengthUnit", unit}).code, kExitOk);
+    for (const ZEPAppPage& page : AppPages()) {
+      const nlohmann::json shown = nlohmann::json::parse(Run({"show", page.name, "--json"}).out);
+      for (const auto& c : shown["controls"]) {
+        if (c["kind"] != "spinner" || !c["enabled"].get<bool>()) continue;
+        const std::string key = page.name + "." + c["control"].get<std::string>();
+        const std::string value = Run({"get", key}).out;
+        const std::string before = ReadBytes(_settings);
+        Result back = Run({"set", key, value.substr(0, value.size() - 1)});
+        EXPECT_EQ(back.code, kExitOk) << key << " " << value << back.err;
+        EXPECT_NE(back.out.find("(unchanged)"), std::string::npos) << key << " " << value;
+        EXPECT_EQ(ReadBytes(_settings), before) << key;
+        ++checked;
+      }
+    }
+  }
+  EXPECT_GT(checked, 30);
+}
+
+TEST_F(AppCli, ScriptsCanTrustTheExitCode) {
+  const std::string cmd = "'" + std::string(ZEP_APP_BINARY) + "' --settings '" + _settings + "' get DrwViewFrame";
+  EXPECT_EQ(WEXITSTATUS(std::system((cmd + " > /dev/full 2>/dev/null").c_str())), kExitFailure);
+  EXPECT_EQ(WEXITSTATUS(std::system((cmd + " > /dev/null").c_str())), kExitOk);
+  // A completion script that bash reads, knowing the pages and the controls.
+  const std::string script = Run({"completion", "bash"}).out;
+  EXPECT_NE(script.find("complete -F _drafting_options drafting-options"), std::string::npos);
+  EXPECT_NE(script.find("general.checkViewFrame"), std::string::npos);
+  std::ofstream(_dir / "completion.bash") << script;
+  EXPECT_EQ(std::system(("bash -n '" + (_dir / "completion.bash").string() + "'").c_str()), 0);
+  // Each command's help has examples; the program's help the exit codes.
+  EXPECT_NE(Run({"set", "--help"}).out.find("Examples:"), std::string::npos);
+  EXPECT_NE(Run({"--help"}).out.find("Exit codes:"), std::string::npos);
+}

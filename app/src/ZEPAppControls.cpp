@@ -511,7 +511,8 @@ bool ParseSpinnerValue(const ZEPDlgSpinner& iSpinner, const std::string& iText, 
     oError = Quoted(iText) + " is too large";
     return false;
   }
-  if (word.empty()) {
+  // The unit the control shows ("30 %" as get prints it) is the same as none.
+  if (word.empty() || Lower(word) == Lower(iSpinner.UnitSymbol())) {
     oInternal = iSpinner.FromDisplay(number);
   } else {
     const UnitWord* unit = nullptr;
