@@ -746,3 +746,25 @@ TEST_F(AppCli, ScriptsCanTrustTheExitCode) {
   EXPECT_NE(Run({"set", "--help"}).out.find("Examples:"), std::string::npos);
   EXPECT_NE(Run({"--help"}).out.find("Exit codes:"), std::string::npos);
 }
+
+TEST_F(AppCli, RenderedDialogExplainsGreyControlsAndOpensTheAskedTab) {
+  ASSERT_EQ(Run({"lock", "DrwViewFrame"}).code, kExitOk);
+  const std::string html = Run({"render", "--html", "-", "general", "grid", "--range", "3"}).out;
+  // Tooltips: who locked it, and which control keeps another disabled.
+  EXPECT_TRUE(std::regex_search(html, std::regex("data-name=\"checkViewFrame_dialog\" title=\"[^\"]*Locked by " +
+                                                 CurrentUserName())))
+      << "locked control without its reason";
+  EXPECT_TRUE(std::regex_search(
+      html, std::regex("data-name=\"editorGridSpacingV_dialog\" title=\"[^\"]*turn &quot;Allow distortions&quot;")));
+  EXPECT_NE(html.find("<span class=\"label\">Scale range:</span>"), std::string::npos);
+  EXPECT_NE(html.find("1\xE2\x80\xAF" "000\xE2\x80\xAF" "000 mm"), std::string::npos); // grouped for reading
+  EXPECT_NE(html.find(".panels .page:target"), std::string::npos);                   // #page-NAME opens it
+  EXPECT_NE(html.find("overflow:auto"), std::string::npos);                          // scrolls when narrow
+  // Without its catalogs the program stops at once rather than drawing a dialog without texts.
+  setenv("ZEP_RESOURCES", (_dir / "nowhere").c_str(), 1);
+  Result missing = Run({"render", "--html", "-"});
+  unsetenv("ZEP_RESOURCES");
+  EXPECT_EQ(missing.code, kExitFailure);
+  EXPECT_NE(missing.err.find((_dir / "nowhere").string() + "/catalogs"), std::string::npos) << missing.err;
+  EXPECT_TRUE(missing.out.empty());
+}
