@@ -37,6 +37,14 @@ private:
     kSlotCount
   };
   static const ZEPSettingSlotHooks<ZEP2DBaseOptGeoFrm>& Hooks(int iSlot);
+  // A check button of a sub-dialog: the slot of its flag, its name and cell.
+  struct DialogCheck {
+    int slot;
+    const char* name;
+    short row, column;
+  };
+  template <std::size_t N>
+  void BuildChecks(ZEPDialog* iFrame, const DialogCheck (&iChecks)[N], ZEPSettingInfo& ioInfo);
   ZEPDrwLockCheckButton* Check(ZEPDialog* iFrame, int iSlot, const char* iName, short iRow,
                                short iColumn, short iWidth, ZEPSettingInfo& ioInfo);
   ZEPDrwLockComboColor* ColorCombo(ZEPDialog* iFrame, const char* iName, short iRow, short iColumn,

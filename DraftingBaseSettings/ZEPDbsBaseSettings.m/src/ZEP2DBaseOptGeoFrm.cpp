@@ -15,13 +15,6 @@
 namespace {
 using Services = ZEPDrwSettingsServices;
 
-// A check button of a sub-dialog: the slot of its flag, its name and cell.
-struct DialogCheck {
-  int slot;
-  const char* name;
-  short row, column;
-};
-
 ZEPDlgFrame* Section(ZEPDialog* iParent, const char* iName, const char* iIcon, short iRow) {
   auto* section = new ZEPDlgToolsOptionsFrame(iParent, iName, iIcon, *iIcon ? 4 : 6);
   section->SetGridConstraints(iRow, 0, 1, 1, 0x1E);
@@ -306,27 +299,22 @@ void ZEP2DBaseOptGeoFrm::BuildDlgSmartPick(ZEPDlgDialog* iDialog, ZEPSettingInfo
       {kSlotSmartPickParaPerpenTang, "checkSmartPickParaPerpenTang", 2, 0},
       {kSlotSmartPickHoriVerti, "checkSmartPickHoriVerti", 3, 0},
   };
-  ZEPDlgFrame* frame = Section(iDialog, "frameSmartPick", "I_ConstraintCopilot", 0);
-  for (const DialogCheck& c : checks)
-    Check(frame, c.slot, c.name, c.row, c.column, 1, ioInfo);
-  for (const DialogCheck& c : checks)
-    Services::UpdateCheckButton(_pChk[c.slot], _bFlag[c.slot]);
+  BuildChecks(Section(iDialog, "frameSmartPick", "I_ConstraintCopilot", 0), checks, ioInfo);
 }
 
 void ZEP2DBaseOptGeoFrm::BuildDlgTypeCst(ZEPDlgDialog* iDialog, ZEPSettingInfo& ioInfo) {
   static const DialogCheck checks[] = {
-      {kSlotCstVisuHori, "checkCstVisuHori", 0, 0},
-      {kSlotCstVisuVerti, "checkCstVisuVerti", 0, 1},
-      {kSlotCstVisuPara, "checkCstVisuPara", 1, 0},
-      {kSlotCstVisuPerpen, "checkCstVisuPerpen", 1, 1},
-      {kSlotCstVisuConcen, "checkCstVisuConcen", 2, 0},
-      {kSlotCstVisuCoinci, "checkCstVisuCoinci", 2, 1},
-      {kSlotCstVisuTangen, "checkCstVisuTangen", 3, 0},
-      {kSlotCstVisuSym, "checkCstVisuSym", 3, 1},
+      {kSlotCstVisuHori, "checkCstVisuHori", 0, 0},     {kSlotCstVisuVerti, "checkCstVisuVerti", 0, 1},
+      {kSlotCstVisuPara, "checkCstVisuPara", 1, 0},     {kSlotCstVisuPerpen, "checkCstVisuPerpen", 1, 1},
+      {kSlotCstVisuConcen, "checkCstVisuConcen", 2, 0}, {kSlotCstVisuCoinci, "checkCstVisuCoinci", 2, 1},
+      {kSlotCstVisuTangen, "checkCstVisuTangen", 3, 0}, {kSlotCstVisuSym, "checkCstVisuSym", 3, 1},
   };
-  ZEPDlgFrame* frame = Section(iDialog, "frameConstraintsTypes", "I_D3M_CstVisu", 0);
-  for (const DialogCheck& c : checks)
-    Check(frame, c.slot, c.name, c.row, c.column, 1, ioInfo);
-  for (const DialogCheck& c : checks)
-    Services::UpdateCheckButton(_pChk[c.slot], _bFlag[c.slot]);
+  BuildChecks(Section(iDialog, "frameConstraintsTypes", "I_D3M_CstVisu", 0), checks, ioInfo);
+}
+
+// The check buttons of a dialog, each with its own info hook, then each showing its flag.
+template <std::size_t N>
+void ZEP2DBaseOptGeoFrm::BuildChecks(ZEPDialog* iFrame, const DialogCheck (&iChecks)[N], ZEPSettingInfo& ioInfo) {
+  for (const DialogCheck& c : iChecks) Check(iFrame, c.slot, c.name, c.row, c.column, 1, ioInfo);
+  for (const DialogCheck& c : iChecks) Services::UpdateCheckButton(_pChk[c.slot], _bFlag[c.slot]);
 }
