@@ -172,20 +172,26 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference}) {
       const char* section = kind == ZEPAppRepoKind::Setting ? "settings" : "preferences";
       for (const auto& [repo, entries] : ioFile.doc.Of(kind)) {
+        // Looked up once per repository; the messages are built only for what is reported.
         const bool isRuled = ruled.count({kind, repo}) != 0;
+        const ZEPAppRepoEntries* admins = nullptr;
+        if (!iAdmin)
+          if (auto a = admin.doc.Of(kind).find(repo); a != admin.doc.Of(kind).end()) admins = &a->second;
+        if (!isRuled && !admins) continue; // nothing to hold the values to
         for (const auto& [attr, entry] : entries) {
-          const std::string where = std::string(section) + "/" + repo + "/" + attr;
-          auto rule = rules.find({kind, repo, attr});
+          auto rule = isRuled ? rules.find({kind, repo, attr}) : rules.end();
           if (isRuled && rule == rules.end()) {
             found.push_back({JsonPointer({section, repo, attr}), true,
-                             where + ": unknown attribute; nothing reads it" +
+                             std::string(section) + "/" + repo + "/" + attr + ": unknown attribute; nothing reads it" +
                                  (iAdmin ? ", so neither its value nor its lock applies" : "")});
             ioFile.unusable.insert({kind, repo, attr});
             continue;
           }
           if (!entry.value) continue;
           std::string why = rule == rules.end() ? std::string() : Verdict(rule->second, *entry.value);
-          const ZEPAppAttrEntry* byAdmin = iAdmin ? nullptr : AdminEntry(kind, repo, attr);
+          const ZEPAppAttrEntry* byAdmin = nullptr;
+          if (admins)
+            if (auto a = admins->find(attr); a != admins->end()) byAdmin = &a->second;
           if (why.empty() && byAdmin && byAdmin->locked)
             why = "is locked (" + LockText(byAdmin->by) + "); this value is ignored";
           else if (!why.empty())
@@ -194,7 +200,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
                                                        : "; the default is used instead");
           if (why.empty()) continue;
           found.push_back({JsonPointer({section, repo, attr, kTypeNames[entry.value->index()]}), false,
-                           where + ": " + why});
+                           std::string(section) + "/" + repo + "/" + attr + ": " + why});
           ioFile.unusable.insert({kind, repo, attr});
         }
       }
@@ -210,18 +216,27 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
 
   // Reads and parses one file into ioFile. False with the faults when it could not be read.
   bool ReadInto(File& ioFile, bool iAdmin, std::vector<ZEPAppFileError>& oFaults) {
-    ioFile.doc = ZEPAppSettingsDoc();
-    ioFile.bytes.clear();
-    ioFile.fault.reset();
     try {
       ZEPAppFileError err;
-      if (!ReadFile(ioFile.path, ioFile.bytes, ioFile.onDisk, err)) {
+      std::string bytes;
+      bool onDisk = false;
+      const bool read = ReadFile(ioFile.path, bytes, onDisk, err);
+      // The bytes this run read or wrote last, read again (a save under the lock when no one
+      // else wrote meanwhile): the content is the same, there is nothing to parse.
+      if (read && onDisk && ioFile.onDisk && !ioFile.fault && bytes == ioFile.bytes) return true;
+      ioFile.doc = ZEPAppSettingsDoc();
+      ioFile.bytes = std::move(bytes);
+      ioFile.onDisk = onDisk;
+      ioFile.fault.reset();
+      if (!read) {
         oFaults.push_back(err);
       } else {
         std::vector<ZEPAppFileError> faults = ParseSettingsText(ioFile.bytes, ioFile.path, iAdmin, ioFile.doc);
         oFaults.insert(oFaults.end(), faults.begin(), faults.end());
       }
     } catch (const std::exception& ex) { // out of memory and the like: still a report, not a crash
+      ioFile.doc = ZEPAppSettingsDoc();
+      ioFile.bytes.clear();
       oFaults.push_back(ZEPAppFileError{ioFile.path, 0, 0, std::string("cannot be read: ") + ex.what(), true});
     }
     if (oFaults.empty()) return true;
@@ -249,10 +264,10 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     applied.clear();
     const auto& users = user.doc.Of(iKind);
     if (auto it = users.find(ioRepo.GetName()); it != users.end())
-      for (const auto& [attr, entry] : it->second)
-        if (entry.value && !user.unusable.count({iKind, ioRepo.GetName(), attr})) {
+      for (const auto& [attr, entry] : it->second) // in order: each insertion goes at the end
+        if (entry.value && (user.unusable.empty() || !user.unusable.count({iKind, ioRepo.GetName(), attr}))) {
           ioRepo.SetUserValue(attr, *entry.value);
-          applied[attr] = *entry.value;
+          applied.emplace_hint(applied.end(), attr, *entry.value);
         }
     const auto& admins = admin.doc.Of(iKind);
     if (auto it = admins.find(ioRepo.GetName()); it != admins.end())
