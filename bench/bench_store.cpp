@@ -88,6 +88,21 @@ void WriteAll(ZEPSysSettingRepository& ioRepo, int iCount, int iRound) {
   }
 }
 
+// A store loaded from a sample file of N attributes, with the benchmark's repository open.
+struct LoadedStore {
+  explicit LoadedStore(int iCount) : file((folder.path / "settings.json").string()) {
+    WriteSample(file, iCount);
+    ZEPSysSettingRepository::CloseAll();
+    store.Load(file);
+    repo = store.OpenSettings(kBenchRepository);
+  }
+  ~LoadedStore() { ZEPSysSettingRepository::CloseAll(); }
+  BenchFolder folder;
+  std::string file;
+  ZEPAppSettingsFile store;
+  ZEPSysSettingRepository* repo = nullptr;
+};
+
 void Store_Load(benchmark::State& state) {
   BenchFolder folder;
   const std::string file = (folder.path / "settings.json").string();
@@ -104,31 +119,22 @@ void Store_Load(benchmark::State& state) {
 }
 
 void Store_SaveAll(benchmark::State& state) {
-  BenchFolder folder;
-  const std::string file = (folder.path / "settings.json").string();
   const int n = static_cast<int>(state.range(0));
-  WriteSample(file, n);
-  ZEPSysSettingRepository::CloseAll();
-  ZEPAppSettingsFile store;
-  store.Load(file);
-  ZEPSysSettingRepository* repo = store.OpenSettings(kBenchRepository);
+  LoadedStore loaded(n);
+  ZEPAppSettingsFile& store = loaded.store;
+  ZEPSysSettingRepository* repo = loaded.repo;
   int round = 0;
   for (auto _ : state) {
     WriteAll(*repo, n, ++round);
     if (FAILED(repo->SaveRepository())) state.SkipWithError(store.LastError().c_str());
   }
-  ZEPSysSettingRepository::CloseAll();
 }
 
 void Store_ChangeOneAndSave(benchmark::State& state) {
-  BenchFolder folder;
-  const std::string file = (folder.path / "settings.json").string();
   const int n = static_cast<int>(state.range(0));
-  WriteSample(file, n);
-  ZEPSysSettingRepository::CloseAll();
-  ZEPAppSettingsFile store;
-  store.Load(file);
-  ZEPSysSettingRepository* repo = store.OpenSettings(kBenchRepository);
+  LoadedStore loaded(n);
+  ZEPAppSettingsFile& store = loaded.store;
+  ZEPSysSettingRepository* repo = loaded.repo;
   const std::string name = AttributeName(n / 2 / 3 * 3 + 1); // an int in the middle
   int round = 0;
   for (auto _ : state) {
@@ -136,7 +142,6 @@ void Store_ChangeOneAndSave(benchmark::State& state) {
     repo->WriteAttr(name.c_str(), &v, 1);
     if (FAILED(repo->SaveRepository())) state.SkipWithError(store.LastError().c_str());
   }
-  ZEPSysSettingRepository::CloseAll();
 }
 
 // One save of a page's size: the read-modify-write under the file's lock beside the plain
@@ -157,20 +162,15 @@ void Store_PageSaveUnlocked(benchmark::State& state) {
 
 void Store_PageSaveLocked(benchmark::State& state) {
   state.SetLabel("20 attributes");
-  BenchFolder folder;
-  const std::string file = (folder.path / "settings.json").string();
-  WriteSample(file, 20);
-  ZEPSysSettingRepository::CloseAll();
-  ZEPAppSettingsFile store;
-  store.Load(file);
-  ZEPSysSettingRepository* repo = store.OpenSettings(kBenchRepository);
+  LoadedStore loaded(20);
+  ZEPAppSettingsFile& store = loaded.store;
+  ZEPSysSettingRepository* repo = loaded.repo;
   int round = 0;
   for (auto _ : state) {
     const int v = ++round;
     repo->WriteAttr(AttributeName(1).c_str(), &v, 1);
     if (FAILED(repo->SaveRepository())) state.SkipWithError(store.LastError().c_str());
   }
-  ZEPSysSettingRepository::CloseAll();
 }
 
 // Registered by size, then by operation, ours first, so that each size's figures come together.
