@@ -23,9 +23,10 @@ test: configure
 	@cd $(BUILD) && ctest --output-on-failure -j $(JOBS)
 
 bench: deps
+	@./scripts/install-bench-deps
 	@cmake -S . -B build-bench -DCMAKE_BUILD_TYPE=Release -DZEP_BUILD_BENCH=ON >/dev/null
 	@cmake --build build-bench -j $(JOBS) --target zep_bench
-	@build-bench/bench/zep_bench --benchmark_repetitions=5 --benchmark_report_aggregates_only=true
+	@build-bench/bench/zep_bench --benchmark_repetitions=5 --benchmark_enable_random_interleaving=true --benchmark_report_aggregates_only=true
 
 clean:
 	rm -rf build build-asan build-bench

@@ -265,3 +265,39 @@ BENCHMARK(DisplayWithDialogsOpen);
 BENCHMARK(AnnotLegendDialogRoundTrip);
 BENCHMARK(AnnotClickTableResize);
 BENCHMARK(DisplayClickDesignMode);
+
+// The application's pages, bound to the settings store: each page built and initialised by
+// itself, and all of them together as the dialog opens them.
+#include "ZEPAppPages.h"
+
+namespace {
+void OpenAppRepositories() {
+  for (const std::string& name : zepapp::AppRepositories()) ZEPSysSettingRepository::Open(name);
+  zepapp::ApplyDefaults();
+}
+
+void AppPage(benchmark::State& state, std::size_t iPage) {
+  OpenAppRepositories();
+  const zepapp::ZEPAppPage& page = zepapp::AppPages().at(iPage);
+  state.SetLabel(page.name);
+  ZEPDlgWindow root(nullptr, "root", 0);
+  for (auto _ : state) delete page.open(&root);
+}
+
+void AppPagesAll(benchmark::State& state) {
+  OpenAppRepositories();
+  ZEPDlgWindow root(nullptr, "root", 0);
+  for (auto _ : state) {
+    std::vector<ZEPDlgFrame*> pages;
+    for (const zepapp::ZEPAppPage& page : zepapp::AppPages()) pages.push_back(page.open(&root));
+    for (ZEPDlgFrame* page : pages) delete page;
+  }
+}
+
+const int kAppPagesRegistered = [] {
+  for (std::size_t i = 0; i < zepapp::AppPages().size(); ++i)
+    benchmark::RegisterBenchmark("AppPage", AppPage, i)->Unit(benchmark::kMicrosecond);
+  benchmark::RegisterBenchmark("AppPages/All", AppPagesAll)->Unit(benchmark::kMicrosecond);
+  return 0;
+}();
+} // namespace

@@ -5,6 +5,8 @@
 #include <charconv>
 #include <cmath>
 #include <cstdio>
+#include <typeindex>
+#include <typeinfo>
 #include <unordered_map>
 
 ZEP_IMPLEMENT_CLASS(ZEPNotification, ZEPBaseUnknown)
@@ -152,30 +154,45 @@ ZEPDialog::~ZEPDialog() {
 
 ZEPString ZEPDialog::GetResourceFilename(int) const { return ZEPString(); }
 
-// A new widget takes the title and help texts of its name from the catalogs of its
-// ancestors, nearest ancestor and most derived catalog first.
-void ZEPDialog::LoadCatalogTexts() {
-  static const struct {
-    const char* suffix;
-    ZEPUnicodeString ZEPDialog::*text;
-  } kinds[] = {{".Title", &ZEPDialog::_title},
-               {".Help", &ZEPDialog::_help},
-               {".ShortHelp", &ZEPDialog::_shortHelp},
-               {".LongHelp", &ZEPDialog::_longHelp}};
-  for (const auto& k : kinds) {
-    bool found = false;
-    for (const ZEPDialog* a = _pParent; a && !found; a = a->_pParent) {
-      for (int i = 0; i < 16 && !found; ++i) {
-        ZEPString cat = a->GetResourceFilename(i);
-        if (cat.empty()) break;
-        ZEPUnicodeString text;
-        if (ZEPMsgCatalog::Find(cat, _name + k.suffix, text)) {
-          this->*k.text = text;
-          found = true;
-        }
-      }
-    }
+namespace {
+// The catalogs of a widget's GetResourceFilename chain, looked up once per class: the chain
+// belongs to the class (during construction, to the part constructed so far, which typeid
+// tells apart).
+const std::vector<const ZEPMsgCatalog::Loaded*>& CatalogChain(const ZEPDialog& iWidget) {
+  static std::unordered_map<std::type_index, std::vector<const ZEPMsgCatalog::Loaded*>> chains;
+  static unsigned generation = ZEPMsgCatalog::Generation();
+  if (generation != ZEPMsgCatalog::Generation()) {
+    chains.clear(); // the catalogs were forgotten
+    generation = ZEPMsgCatalog::Generation();
   }
+  auto [it, added] = chains.try_emplace(std::type_index(typeid(iWidget)));
+  if (added)
+    for (int i = 0; i < 16; ++i) {
+      const ZEPString name = iWidget.GetResourceFilename(i);
+      if (name.empty()) break;
+      it->second.push_back(&ZEPMsgCatalog::Get(name));
+    }
+  return it->second;
+}
+} // namespace
+
+// A new widget takes the title and help texts of its name from the catalogs of its
+// ancestors, nearest ancestor and most derived catalog first: one look-up of its name in each.
+void ZEPDialog::LoadCatalogTexts() {
+  static ZEPUnicodeString ZEPDialog::*const kTexts[ZEPMsgCatalog::WidgetTextCount] = {
+      &ZEPDialog::_title, &ZEPDialog::_help, &ZEPDialog::_shortHelp, &ZEPDialog::_longHelp};
+  int missing = ZEPMsgCatalog::WidgetTextCount;
+  bool found[ZEPMsgCatalog::WidgetTextCount] = {};
+  for (const ZEPDialog* a = _pParent; a && missing > 0; a = a->_pParent)
+    for (const ZEPMsgCatalog::Loaded* catalog : CatalogChain(*a)) {
+      const std::string* const* texts = ZEPMsgCatalog::FindWidget(*catalog, _name);
+      for (int k = 0; texts && k < ZEPMsgCatalog::WidgetTextCount; ++k)
+        if (!found[k] && texts[k]) {
+          this->*kTexts[k] = ZEPUnicodeString(*texts[k]);
+          found[k] = true;
+          --missing;
+        }
+    }
 }
 
 void ZEPDialog::SetGridConstraints(short iRow, short iColumn, short iWidth, short iHeight,

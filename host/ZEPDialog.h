@@ -156,7 +156,8 @@ public:
   virtual ZEPString GetName() const { return _name; }
   // The name the widget was constructed with, whatever GetName answers.
   const ZEPString& GetOwnName() const { return _name; }
-  // Message catalog chain: index 0 is the class's own catalog; empty when none.
+  // Message catalog chain: index 0 is the class's own catalog; empty when none. The same for
+  // every instance of a class: the toolkit looks it up once per class.
   virtual ZEPString GetResourceFilename(int iIndex = 0) const;
 
   unsigned long GetStyle() const { return _style; }

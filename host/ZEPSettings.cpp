@@ -161,7 +161,11 @@ int ZEPSysSettingRepository::ResetAttr(const std::string& iName) {
   return 1;
 }
 
-void ZEPSysSettingRepository::SetUserValue(const std::string& iName, const Value& iValue) { _user[iName] = iValue; }
+void ZEPSysSettingRepository::SetUserValue(const std::string& iName, const Value& iValue) {
+  // Loading gives the names in order: then the value goes at the end without a search.
+  if (_user.empty() || _user.rbegin()->first < iName) _user.emplace_hint(_user.end(), iName, iValue);
+  else _user[iName] = iValue;
+}
 
 ZEPSysPreferenceRepository* ZEPSysPreferenceRepository::GetPreferenceRepository(const char* iName) {
   return Lookup<ZEPSysPreferenceRepository>(iName);

@@ -1,5 +1,6 @@
 #include "ZEPSystem.h"
 
+#include <array>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -7,6 +8,7 @@
 #include <fstream>
 #include <map>
 #include <memory>
+#include <unordered_map>
 
 // ---- strings ------------------------------------------------------------------------------
 namespace {
@@ -143,11 +145,21 @@ void Check_Handler_Failed__(const char* iExpression, const char* iPath, int iLin
 // ---- environment and catalogs ------------------------------------------------------------------
 const char* ZEPGetEnv(const char* iName) { return iName ? std::getenv(iName) : nullptr; }
 
+struct ZEPMsgCatalog::Loaded {
+  std::map<std::string, std::string> keys;
+  // Widget name -> its texts, pointing into keys.
+  std::unordered_map<std::string, std::array<const std::string*, WidgetTextCount>> widgets;
+};
+
 namespace {
-using Catalog = std::map<std::string, std::string>;
+using Catalog = ZEPMsgCatalog::Loaded;
 std::map<std::string, Catalog>& Catalogs() {
   static std::map<std::string, Catalog> loaded;
   return loaded;
+}
+unsigned& CatalogGeneration() {
+  static unsigned generation = 0;
+  return generation;
 }
 
 // Parses lines of the form: Key = "text";  with \" \\ \n escapes.
@@ -178,7 +190,14 @@ Catalog LoadCatalog(const std::string& iPath) {
         text += c;
       }
     }
-    if (closed) cat[key] = text;
+    if (closed) cat.keys[key] = text;
+  }
+  static const char* const kSuffixes[ZEPMsgCatalog::WidgetTextCount] = {"Title", "Help", "ShortHelp", "LongHelp"};
+  for (const auto& [key, text] : cat.keys) {
+    const size_t dot = key.rfind('.');
+    if (dot == std::string::npos) continue;
+    for (int k = 0; k < ZEPMsgCatalog::WidgetTextCount; ++k)
+      if (key.compare(dot + 1, std::string::npos, kSuffixes[k]) == 0) cat.widgets[key.substr(0, dot)][k] = &text;
   }
   return cat;
 }
@@ -193,6 +212,15 @@ const Catalog& GetCatalog(const std::string& iName) {
   return Catalogs().emplace(iName, std::move(cat)).first->second;
 }
 } // namespace
+
+const ZEPMsgCatalog::Loaded& ZEPMsgCatalog::Get(const ZEPString& iCatalog) { return GetCatalog(iCatalog); }
+
+const std::string* const* ZEPMsgCatalog::FindWidget(const Loaded& iCatalog, const std::string& iName) {
+  auto it = iCatalog.widgets.find(iName);
+  return it == iCatalog.widgets.end() ? nullptr : it->second.data();
+}
+
+unsigned ZEPMsgCatalog::Generation() { return CatalogGeneration(); }
 
 namespace {
 bool HasCatalogs(const std::string& iDir) {
@@ -230,12 +258,15 @@ std::string ZEPMsgCatalog::ResourceDir() {
   return found;
 }
 
-void ZEPMsgCatalog::Reset() { Catalogs().clear(); }
+void ZEPMsgCatalog::Reset() {
+  Catalogs().clear();
+  ++CatalogGeneration();
+}
 
 bool ZEPMsgCatalog::Find(const ZEPString& iCatalog, const ZEPString& iKey, ZEPUnicodeString& oText) {
   const Catalog& cat = GetCatalog(iCatalog);
-  auto it = cat.find(iKey);
-  if (it == cat.end()) return false;
+  auto it = cat.keys.find(iKey);
+  if (it == cat.keys.end()) return false;
   oText = ZEPUnicodeString(it->second);
   return true;
 }

@@ -111,6 +111,17 @@ public:
                                        void* iReserved = nullptr);
   // True and the text when the catalog holds the key.
   static bool Find(const ZEPString& iCatalog, const ZEPString& iKey, ZEPUnicodeString& oText);
+
+  // A catalog as loaded, indexed once by widget name for the toolkit.
+  struct Loaded;
+  enum WidgetText { Title, Help, ShortHelp, LongHelp, WidgetTextCount };
+  // The catalog, loaded at the first call (an empty one when there is no such file).
+  static const Loaded& Get(const ZEPString& iCatalog);
+  // The texts of a widget name in iCatalog (keys "<name>.Title", ".Help", ".ShortHelp",
+  // ".LongHelp"), each null when the catalog does not hold it; null when it holds none.
+  static const std::string* const* FindWidget(const Loaded& iCatalog, const std::string& iName);
+  // Changes at each Reset: what was taken from Get before is gone then.
+  static unsigned Generation();
   static std::string ResourceDir();
   // Forgets every loaded catalog (tests that change the resources folder).
   static void Reset();

@@ -230,6 +230,31 @@ TEST_F(SettingsFileTest, FailedSaveLeavesTheOldFileAndNoTemporaryFile) {
   ZEPAppSettingsFile reread;
   ASSERT_EQ(S_OK, reread.Load(_user.string()));
   EXPECT_EQ(std::vector<int>{500}, Read<int>(reread.OpenSettings("DraftingOptions"), "DrwPaperLengthUnit", 1));
+
+  // A failed save leaves nothing of itself behind: changed back, the value is not written later.
+  auto failing = std::make_shared<FaultyOps>();
+  failing->failAt = FaultyOps::RenameStep;
+  ZEPSysSettingRepository::CloseAll();
+  ZEPAppSettingsFile store2(failing);
+  ASSERT_EQ(S_OK, store2.Load(_user.string()));
+  ZEPSysSettingRepository* again = store2.OpenSettings("DraftingOptions");
+  for (int v : {7, 500}) {
+    again->WriteAttr("DrwPaperLengthUnit", &v, 1);
+    again->WriteAttr("New", &v, 1);
+    EXPECT_LT(again->SaveRepository(), 0);
+  }
+  again->ResetAttr("New");
+  failing->failAt = FaultyOps::None;
+  const int other = 3;
+  again->WriteAttr("Other", &other, 1);
+  ASSERT_EQ(S_OK, again->SaveRepository()) << store2.LastError();
+  ZEPSysSettingRepository::CloseAll();
+  ZEPAppSettingsFile last;
+  ASSERT_EQ(S_OK, last.Load(_user.string()));
+  ZEPSysSettingRepository* saved = last.OpenSettings("DraftingOptions");
+  EXPECT_EQ(std::vector<int>{500}, Read<int>(saved, "DrwPaperLengthUnit", 1));
+  EXPECT_EQ(std::vector<int>{3}, Read<int>(saved, "Other", 1));
+  EXPECT_FALSE(saved->HasUserValue("New"));
 }
 
 TEST_F(SettingsFileTest, SaveWithNothingChangedWritesNothing) {

@@ -143,6 +143,7 @@ bool ReadRegularFile(const std::string& iPath, std::size_t iMaxSize, std::string
     return false;
   }
   // The size fstat tells may be wrong (a file growing meanwhile); the read itself is bounded.
+  if (st.st_size > 0) oText.reserve(std::min(static_cast<std::size_t>(st.st_size), iMaxSize));
   char buffer[65536];
   for (;;) {
     const ssize_t n = ::read(fd, buffer, sizeof buffer);

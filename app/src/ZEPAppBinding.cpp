@@ -16,8 +16,14 @@ const std::vector<ZEPAppSetting>& AppSettings() {
 }
 
 const ZEPAppSetting* FindSetting(const std::string& iPage, const std::string& iAttribute) {
-  for (const ZEPAppSetting& s : AppSettings())
-    if (s.page == iPage && s.attribute == iAttribute) return &s;
+  for (int r = FirstSettingRow(iAttribute); r >= 0; r = kNextSameAttribute[static_cast<std::size_t>(r)])
+    if (kAppSettingKeys[r].page == iPage) return &AppSettings()[static_cast<std::size_t>(r)];
+  return nullptr;
+}
+
+const ZEPAppSetting* ZEPAppBinding::Setting(int iRow) const {
+  for (int r = iRow; r >= 0; r = kNextSameAttribute[static_cast<std::size_t>(r)])
+    if (kAppSettingKeys[r].page == _page) return &AppSettings()[static_cast<std::size_t>(r)];
   return nullptr;
 }
 
@@ -46,14 +52,13 @@ template <class T, class S> T FromStored(S iValue) {
 }
 } // namespace
 
-template <class T> long ZEPAppBinding::Read(const char* iAttribute, T* oValues, int iCount) {
+template <class T> long ZEPAppBinding::Read(const ZEPAppSetting* setting, T* oValues, int iCount) {
   constexpr ZEPAppStored kind = StoredOf<T>();
   if constexpr (kind == ZEPAppStored::Unsupported) {
-    (void)iAttribute, (void)oValues, (void)iCount;
+    (void)setting, (void)oValues, (void)iCount;
     return E_NOTIMPL;
   } else {
     using S = typename StoredType<kind>::type;
-    const ZEPAppSetting* setting = FindSetting(_page, iAttribute);
     if (!setting || !oValues || iCount <= 0) return E_FAIL;
     // The default first; the repository's values replace it where it has them.
     std::vector<S> buffer(static_cast<size_t>(iCount), S());
@@ -65,14 +70,13 @@ template <class T> long ZEPAppBinding::Read(const char* iAttribute, T* oValues, 
   }
 }
 
-template <class T> long ZEPAppBinding::Write(const char* iAttribute, const T* iValues, int iCount) {
+template <class T> long ZEPAppBinding::Write(const ZEPAppSetting* setting, const T* iValues, int iCount) {
   constexpr ZEPAppStored kind = StoredOf<T>();
   if constexpr (kind == ZEPAppStored::Unsupported) {
-    (void)iAttribute, (void)iValues, (void)iCount;
+    (void)setting, (void)iValues, (void)iCount;
     return E_NOTIMPL;
   } else {
     using S = typename StoredType<kind>::type;
-    const ZEPAppSetting* setting = FindSetting(_page, iAttribute);
     if (!setting || !iValues || iCount <= 0) return E_FAIL;
     ZEPSysSettingRepository* rep = Repository(*setting);
     if (!rep) return E_FAIL;
@@ -83,25 +87,25 @@ template <class T> long ZEPAppBinding::Write(const char* iAttribute, const T* iV
   }
 }
 
-long ZEPAppBinding::Info(const char* iAttribute, ZEPSettingInfo& oInfo) const {
+long ZEPAppBinding::Info(int iRow, ZEPSettingInfo& oInfo) const {
   oInfo.Reset();
-  const ZEPAppSetting* setting = FindSetting(_page, iAttribute);
+  const ZEPAppSetting* setting = Setting(iRow);
   if (ZEPSysSettingRepository* rep = setting ? Repository(*setting) : nullptr) rep->GetLockInfo(setting->stored, oInfo);
   return S_OK;
 }
 
 // The kinds the pages use.
-template long ZEPAppBinding::Read(const char*, unsigned char*, int);
-template long ZEPAppBinding::Read(const char*, int*, int);
-template long ZEPAppBinding::Read(const char*, unsigned int*, int);
-template long ZEPAppBinding::Read(const char*, double*, int);
-template long ZEPAppBinding::Read(const char*, ZEPUnicodeString*, int);
-template long ZEPAppBinding::Read(const char*, ZEPListValZEPUnicodeString*, int);
-template long ZEPAppBinding::Write(const char*, const unsigned char*, int);
-template long ZEPAppBinding::Write(const char*, const int*, int);
-template long ZEPAppBinding::Write(const char*, const unsigned int*, int);
-template long ZEPAppBinding::Write(const char*, const double*, int);
-template long ZEPAppBinding::Write(const char*, const ZEPUnicodeString*, int);
-template long ZEPAppBinding::Write(const char*, const ZEPListValZEPUnicodeString*, int);
+template long ZEPAppBinding::Read(const ZEPAppSetting*, unsigned char*, int);
+template long ZEPAppBinding::Read(const ZEPAppSetting*, int*, int);
+template long ZEPAppBinding::Read(const ZEPAppSetting*, unsigned int*, int);
+template long ZEPAppBinding::Read(const ZEPAppSetting*, double*, int);
+template long ZEPAppBinding::Read(const ZEPAppSetting*, ZEPUnicodeString*, int);
+template long ZEPAppBinding::Read(const ZEPAppSetting*, ZEPListValZEPUnicodeString*, int);
+template long ZEPAppBinding::Write(const ZEPAppSetting*, const unsigned char*, int);
+template long ZEPAppBinding::Write(const ZEPAppSetting*, const int*, int);
+template long ZEPAppBinding::Write(const ZEPAppSetting*, const unsigned int*, int);
+template long ZEPAppBinding::Write(const ZEPAppSetting*, const double*, int);
+template long ZEPAppBinding::Write(const ZEPAppSetting*, const ZEPUnicodeString*, int);
+template long ZEPAppBinding::Write(const ZEPAppSetting*, const ZEPListValZEPUnicodeString*, int);
 
 } // namespace zepapp

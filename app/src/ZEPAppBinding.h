@@ -3,7 +3,9 @@
 
 #include "ZEPDrwSettingHooks.h"
 
+#include <array>
 #include <functional>
+#include <string_view>
 #include <string>
 #include <vector>
 
@@ -32,6 +34,30 @@ struct ZEPAppSetting {
 
 const std::vector<ZEPAppSetting>& AppSettings();
 
+// The rows of ZEPAppSettings.def by name, known when compiling, so that each hook of a page
+// finds its row without searching the table.
+struct ZEPAppSettingKey {
+  std::string_view page, attribute;
+};
+inline constexpr ZEPAppSettingKey kAppSettingKeys[] = {
+#define ZEP_APP_SETTING(Page, Attribute, ...) {#Page, #Attribute},
+#include "ZEPAppSettings.def"
+#undef ZEP_APP_SETTING
+};
+inline constexpr int kAppSettingCount = static_cast<int>(std::size(kAppSettingKeys));
+// The first row from iFrom on of an attribute name; -1 when there is none.
+constexpr int FirstSettingRow(std::string_view iAttribute, int iFrom = 0) {
+  for (int r = iFrom; r < kAppSettingCount; ++r)
+    if (kAppSettingKeys[r].attribute == iAttribute) return r;
+  return -1;
+}
+// For each row, the next row of the same attribute name (on another page); -1 when none.
+inline constexpr std::array<int, kAppSettingCount> kNextSameAttribute = [] {
+  std::array<int, kAppSettingCount> next{};
+  for (int r = 0; r < kAppSettingCount; ++r) next[static_cast<std::size_t>(r)] = FirstSettingRow(kAppSettingKeys[r].attribute, r + 1);
+  return next;
+}();
+
 // Called after each successful write of a page's setting (e.g. to tell the sketcher);
 // one observer, replaced by the next call; an empty function removes it.
 void SetWriteObserver(std::function<void(const ZEPAppSetting&)> iObserver);
@@ -41,32 +67,31 @@ class ZEPAppBinding {
 public:
   explicit ZEPAppBinding(std::string iPage) : _page(std::move(iPage)) {}
 
-  template <class T> long Get(const char* iAttribute, T& oValue) { return Read(iAttribute, &oValue, 1); }
-  template <class T> long Get(const char* iAttribute, T* oValues, int iCount) {
-    return Read(iAttribute, oValues, iCount);
-  }
-  template <class T> long Get(const char* iAttribute, T& oRed, T& oGreen, T& oBlue) {
+  // iRow: FirstSettingRow of the attribute's name (the hooks below give it when compiled).
+  template <class T> long Get(int iRow, T& oValue) { return Read(Setting(iRow), &oValue, 1); }
+  template <class T> long Get(int iRow, T* oValues, int iCount) { return Read(Setting(iRow), oValues, iCount); }
+  template <class T> long Get(int iRow, T& oRed, T& oGreen, T& oBlue) {
     T rgb[3] = {oRed, oGreen, oBlue};
-    long rc = Read(iAttribute, rgb, 3);
+    long rc = Read(Setting(iRow), rgb, 3);
     oRed = rgb[0];
     oGreen = rgb[1];
     oBlue = rgb[2];
     return rc;
   }
-  template <class T> long Set(const char* iAttribute, const T& iValue) { return Write(iAttribute, &iValue, 1); }
-  template <class T> long Set(const char* iAttribute, const T* iValues, int iCount) {
-    return Write(iAttribute, iValues, iCount);
-  }
-  template <class T> long Set(const char* iAttribute, const T& iRed, const T& iGreen, const T& iBlue) {
+  template <class T> long Set(int iRow, const T& iValue) { return Write(Setting(iRow), &iValue, 1); }
+  template <class T> long Set(int iRow, const T* iValues, int iCount) { return Write(Setting(iRow), iValues, iCount); }
+  template <class T> long Set(int iRow, const T& iRed, const T& iGreen, const T& iBlue) {
     const T rgb[3] = {iRed, iGreen, iBlue};
-    return Write(iAttribute, rgb, 3);
+    return Write(Setting(iRow), rgb, 3);
   }
   // Every info hook answers 0: each control exists; the record says whether it is locked.
-  long Info(const char* iAttribute, ZEPSettingInfo& oInfo) const;
+  long Info(int iRow, ZEPSettingInfo& oInfo) const;
 
 private:
-  template <class T> long Read(const char* iAttribute, T* oValues, int iCount);
-  template <class T> long Write(const char* iAttribute, const T* iValues, int iCount);
+  // The setting of this page among the rows of the attribute's name from iRow on; null if none.
+  const ZEPAppSetting* Setting(int iRow) const;
+  template <class T> long Read(const ZEPAppSetting* iSetting, T* oValues, int iCount);
+  template <class T> long Write(const ZEPAppSetting* iSetting, const T* iValues, int iCount);
   ZEPSysSettingRepository* Repository(const ZEPAppSetting& iSetting) const;
 
   std::string _page;
@@ -76,6 +101,15 @@ private:
 
 // The hooks of an application page, generated from the page's table.
 #define ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)                                                      \
-  long SetSys##Name(ZEP_SETPARAMS(Kind)) override { return _binding.Set(#Name, ZEP_SETARGS(Kind)); } \
-  long GetSys##Name(ZEP_GETPARAMS(Kind)) override { return _binding.Get(#Name, ZEP_GETARGS(Kind)); } \
-  long GetSys##Name##Info(ZEPSettingInfo& oInfo) override { return _binding.Info(#Name, oInfo); }
+  long SetSys##Name(ZEP_SETPARAMS(Kind)) override {                                                 \
+    static constexpr int kRow = zepapp::FirstSettingRow(#Name);                                     \
+    return _binding.Set(kRow, ZEP_SETARGS(Kind));                                                   \
+  }                                                                                                 \
+  long GetSys##Name(ZEP_GETPARAMS(Kind)) override {                                                 \
+    static constexpr int kRow = zepapp::FirstSettingRow(#Name);                                     \
+    return _binding.Get(kRow, ZEP_GETARGS(Kind));                                                   \
+  }                                                                                                 \
+  long GetSys##Name##Info(ZEPSettingInfo& oInfo) override {                                         \
+    static constexpr int kRow = zepapp::FirstSettingRow(#Name);                                     \
+    return _binding.Info(kRow, oInfo);                                                              \
+  }

@@ -172,20 +172,26 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference}) {
       const char* section = kind == ZEPAppRepoKind::Setting ? "settings" : "preferences";
       for (const auto& [repo, entries] : ioFile.doc.Of(kind)) {
+        // Looked up once per repository; the messages are built only for what is reported.
         const bool isRuled = ruled.count({kind, repo}) != 0;
+        const ZEPAppRepoEntries* admins = nullptr;
+        if (!iAdmin)
+          if (auto a = admin.doc.Of(kind).find(repo); a != admin.doc.Of(kind).end()) admins = &a->second;
+        if (!isRuled && !admins) continue; // nothing to hold the values to
         for (const auto& [attr, entry] : entries) {
-          const std::string where = std::string(section) + "/" + repo + "/" + attr;
-          auto rule = rules.find({kind, repo, attr});
+          auto rule = isRuled ? rules.find({kind, repo, attr}) : rules.end();
           if (isRuled && rule == rules.end()) {
             found.push_back({JsonPointer({section, repo, attr}), true,
-                             where + ": unknown attribute; nothing reads it" +
+                             std::string(section) + "/" + repo + "/" + attr + ": unknown attribute; nothing reads it" +
                                  (iAdmin ? ", so neither its value nor its lock applies" : "")});
             ioFile.unusable.insert({kind, repo, attr});
             continue;
           }
           if (!entry.value) continue;
           std::string why = rule == rules.end() ? std::string() : Verdict(rule->second, *entry.value);
-          const ZEPAppAttrEntry* byAdmin = iAdmin ? nullptr : AdminEntry(kind, repo, attr);
+          const ZEPAppAttrEntry* byAdmin = nullptr;
+          if (admins)
+            if (auto a = admins->find(attr); a != admins->end()) byAdmin = &a->second;
           if (why.empty() && byAdmin && byAdmin->locked)
             why = "is locked (" + LockText(byAdmin->by) + "); this value is ignored";
           else if (!why.empty())
@@ -194,7 +200,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
                                                        : "; the default is used instead");
           if (why.empty()) continue;
           found.push_back({JsonPointer({section, repo, attr, kTypeNames[entry.value->index()]}), false,
-                           where + ": " + why});
+                           std::string(section) + "/" + repo + "/" + attr + ": " + why});
           ioFile.unusable.insert({kind, repo, attr});
         }
       }
@@ -210,18 +216,27 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
 
   // Reads and parses one file into ioFile. False with the faults when it could not be read.
   bool ReadInto(File& ioFile, bool iAdmin, std::vector<ZEPAppFileError>& oFaults) {
-    ioFile.doc = ZEPAppSettingsDoc();
-    ioFile.bytes.clear();
-    ioFile.fault.reset();
     try {
       ZEPAppFileError err;
-      if (!ReadFile(ioFile.path, ioFile.bytes, ioFile.onDisk, err)) {
+      std::string bytes;
+      bool onDisk = false;
+      const bool read = ReadFile(ioFile.path, bytes, onDisk, err);
+      // The bytes this run read or wrote last, read again (a save under the lock when no one
+      // else wrote meanwhile): the content is the same, there is nothing to parse.
+      if (read && onDisk && ioFile.onDisk && !ioFile.fault && bytes == ioFile.bytes) return true;
+      ioFile.doc = ZEPAppSettingsDoc();
+      ioFile.bytes = std::move(bytes);
+      ioFile.onDisk = onDisk;
+      ioFile.fault.reset();
+      if (!read) {
         oFaults.push_back(err);
       } else {
         std::vector<ZEPAppFileError> faults = ParseSettingsText(ioFile.bytes, ioFile.path, iAdmin, ioFile.doc);
         oFaults.insert(oFaults.end(), faults.begin(), faults.end());
       }
     } catch (const std::exception& ex) { // out of memory and the like: still a report, not a crash
+      ioFile.doc = ZEPAppSettingsDoc();
+      ioFile.bytes.clear();
       oFaults.push_back(ZEPAppFileError{ioFile.path, 0, 0, std::string("cannot be read: ") + ex.what(), true});
     }
     if (oFaults.empty()) return true;
@@ -249,10 +264,10 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     applied.clear();
     const auto& users = user.doc.Of(iKind);
     if (auto it = users.find(ioRepo.GetName()); it != users.end())
-      for (const auto& [attr, entry] : it->second)
-        if (entry.value && !user.unusable.count({iKind, ioRepo.GetName(), attr})) {
+      for (const auto& [attr, entry] : it->second) // in order: each insertion goes at the end
+        if (entry.value && (user.unusable.empty() || !user.unusable.count({iKind, ioRepo.GetName(), attr}))) {
           ioRepo.SetUserValue(attr, *entry.value);
-          applied[attr] = *entry.value;
+          applied.emplace_hint(applied.end(), attr, *entry.value);
         }
     const auto& admins = admin.doc.Of(iKind);
     if (auto it = admins.find(ioRepo.GetName()); it != admins.end())
@@ -326,42 +341,124 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
                   "); correct or remove it");
     if (!AdminTrusted()) return E_FAIL;
     const RepoKey key{iKind, iRepo.GetName()};
-    const std::map<std::string, ZEPAppValue>& before = baseline[key];
+    std::map<std::string, ZEPAppValue>& before = baseline[key];
     const std::map<std::string, ZEPAppValue>& now = iRepo.UserValues();
-    std::map<std::string, std::optional<ZEPAppValue>> changes;
-    for (const auto& [attr, value] : now)
-      if (auto it = before.find(attr); it == before.end() || !(it->second == value)) changes[attr] = value;
-    for (const auto& [attr, value] : before)
-      if (!now.count(attr)) changes[attr] = std::nullopt;
-    for (const std::string& attr : erased[key])
-      if (!now.count(attr)) changes[attr] = std::nullopt;
+    std::vector<Change> changes = Changes(before, now, erased[key]);
     if (changes.empty()) return S_OK;
 
     ZEPAppFileLock lock;
     if (!LockAndReread(user, false, lock)) return E_FAIL;
-    ZEPAppSettingsDoc next = user.doc;
-    ZEPAppRepoEntries& entries = next.Of(iKind)[iRepo.GetName()];
-    for (const auto& [attr, value] : changes) {
-      if (value) entries[attr].value = *value;
-      else entries.erase(attr);
+    // The changes go into the file's content in place; what they replace is kept to be put
+    // back if the file cannot be written.
+    auto& repos = user.doc.Of(iKind);
+    auto repo = repos.find(iRepo.GetName());
+    const bool newRepo = repo == repos.end();
+    if (newRepo) repo = repos.emplace(iRepo.GetName(), ZEPAppRepoEntries()).first;
+    ZEPAppRepoEntries& entries = repo->second;
+    std::vector<std::pair<const std::string*, std::optional<ZEPAppAttrEntry>>> replaced;
+    replaced.reserve(changes.size());
+    ForEachPlace(entries, changes, [&](ZEPAppRepoEntries::iterator& ioAt, const Change& c) {
+      const bool there = ioAt != entries.end() && ioAt->first == *c.name;
+      replaced.emplace_back(c.name, there ? std::optional<ZEPAppAttrEntry>(std::move(ioAt->second)) : std::nullopt);
+      if (c.value) {
+        if (!there) ioAt = entries.emplace_hint(ioAt, *c.name, ZEPAppAttrEntry());
+        ioAt->second = ZEPAppAttrEntry{*c.value, false, std::string()};
+        ++ioAt;
+      } else if (there) ioAt = entries.erase(ioAt);
+    });
+    if (entries.empty()) repos.erase(repo);
+    if (long rc = WriteDoc(user, false); FAILED(rc)) {
+      auto& back = repos[iRepo.GetName()];
+      for (auto& [name, old] : replaced) {
+        if (old) back[*name] = std::move(*old);
+        else back.erase(*name);
+      }
+      if (back.empty() && newRepo) repos.erase(iRepo.GetName());
+      return rc;
     }
-    if (entries.empty()) next.Of(iKind).erase(iRepo.GetName());
-    if (long rc = Write(user, std::move(next), false); FAILED(rc)) return rc;
-    baseline[key] = now;
+    // The baseline becomes what the repository holds, by the same changes.
+    ForEachPlace(before, changes, [&](std::map<std::string, ZEPAppValue>::iterator& ioAt, const Change& c) {
+      const bool there = ioAt != before.end() && ioAt->first == *c.name;
+      if (c.value) {
+        if (there) ioAt->second = *c.value;
+        else ioAt = before.emplace_hint(ioAt, *c.name, *c.value);
+        ++ioAt;
+      } else if (there) ioAt = before.erase(ioAt);
+    });
     erased[key].clear();
     return S_OK;
   }
 
-  long Write(File& ioFile, ZEPAppSettingsDoc&& iNext, bool iAdmin) {
+  // One attribute a save changes: its new value, or null to remove it.
+  struct Change {
+    const std::string* name;
+    const ZEPAppValue* value;
+  };
+
+  // What differs between what the repository was given and what it holds now, and what was
+  // reset since, in name order. One pass over both (they are ordered alike).
+  static std::vector<Change> Changes(const std::map<std::string, ZEPAppValue>& iBefore,
+                                     const std::map<std::string, ZEPAppValue>& iNow,
+                                     const std::set<std::string>& iErased) {
+    std::vector<Change> changes;
+    auto b = iBefore.begin();
+    auto n = iNow.begin();
+    while (b != iBefore.end() || n != iNow.end()) {
+      const int order = b == iBefore.end() ? 1 : n == iNow.end() ? -1 : b->first.compare(n->first);
+      if (order > 0) { // new since
+        changes.push_back({&n->first, &n->second});
+        ++n;
+      } else if (order < 0) { // gone since
+        changes.push_back({&b->first, nullptr});
+        ++b;
+      } else {
+        if (!(b->second == n->second)) changes.push_back({&n->first, &n->second});
+        ++b;
+        ++n;
+      }
+    }
+    bool added = false;
+    for (const std::string& attr : iErased)
+      if (!iNow.count(attr) && !iBefore.count(attr)) {
+        changes.push_back({&attr, nullptr});
+        added = true;
+      }
+    if (added)
+      std::sort(changes.begin(), changes.end(), [](const Change& x, const Change& y) { return *x.name < *y.name; });
+    return changes;
+  }
+
+  // Calls iVisit(at, change) for each change in order, at the first element of ioMap not
+  // before the change's name: a search each for a few changes, one walk for many.
+  template <class Map, class Visit>
+  static void ForEachPlace(Map& ioMap, const std::vector<Change>& iChanges, Visit iVisit) {
+    const bool walk = iChanges.size() * 16 > ioMap.size();
+    auto at = ioMap.begin();
+    for (const Change& c : iChanges) {
+      if (walk)
+        while (at != ioMap.end() && at->first < *c.name) ++at;
+      else at = ioMap.lower_bound(*c.name);
+      iVisit(at, c);
+    }
+  }
+
+  // Writes what ioFile.doc holds.
+  long WriteDoc(File& ioFile, bool iAdmin) {
     std::string text, err;
-    if (!FormatSettingsText(iNext, iAdmin, text, err)) return Fail(ioFile.path + ": " + err);
+    if (!FormatSettingsText(ioFile.doc, iAdmin, text, err)) return Fail(ioFile.path + ": " + err);
     if (!(ioFile.onDisk && text == ioFile.bytes)) {
       if (FAILED(WriteFileAtomically(*ops, ioFile.path, text, err))) return Fail(err);
       ioFile.bytes = std::move(text);
       ioFile.onDisk = true;
     }
-    ioFile.doc = std::move(iNext);
     return S_OK;
+  }
+
+  long Write(File& ioFile, ZEPAppSettingsDoc&& iNext, bool iAdmin) {
+    std::swap(ioFile.doc, iNext);
+    const long rc = WriteDoc(ioFile, iAdmin);
+    if (FAILED(rc)) std::swap(ioFile.doc, iNext);
+    return rc;
   }
 
   // Changes one entry of the administrator's file, writes it, then shows it in the repository.

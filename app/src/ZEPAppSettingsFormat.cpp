@@ -3,9 +3,11 @@
 #include <nlohmann/json.hpp>
 
 #include <algorithm>
+#include <charconv>
 #include <climits>
 #include <cmath>
 #include <cstdint>
+#include <cstring>
 #include <set>
 #include <utility>
 
@@ -406,8 +408,258 @@ bool IsFinite(const ZEPAppValue& iValue, std::size_t* oIndex) {
   return true;
 }
 
+namespace {
+// The quick pass: reads a well-formed settings file straight into the document, in one pass
+// over the text, and gives up at the first thing it does not expect (anything the thorough
+// pass would report, and a few rare forms it leaves to it: \u escapes, integers beyond 64
+// bits). Nothing is placed or described here; the thorough pass does that for a file that
+// has something to report.
+class QuickReader {
+public:
+  QuickReader(const std::string& iText, bool iAdmin)
+      : _p(iText.data()), _end(iText.data() + iText.size()), _admin(iAdmin) {}
+
+  bool Document(ZEPAppSettingsDoc& oDoc) {
+    if (_end - _p >= 3 && std::memcmp(_p, "\xEF\xBB\xBF", 3) == 0) _p += 3;
+    bool format = false, settings = false, preferences = false;
+    Space();
+    if (!Take('{')) return false;
+    Space();
+    if (!Take('}')) {
+      do {
+        Space();
+        if (!String(_key)) return false;
+        if (!Colon()) return false;
+        if (_key == "format") {
+          if (format || !Literal("1")) return false;
+          format = true;
+        } else if (_key == "settings") {
+          if (settings || !Section(oDoc.settings)) return false;
+          settings = true;
+        } else if (_key == "preferences") {
+          if (preferences || !Section(oDoc.preferences)) return false;
+          preferences = true;
+        } else return false;
+        Space();
+      } while (Take(','));
+      if (!Take('}')) return false;
+    }
+    Space();
+    return _p == _end;
+  }
+
+private:
+  static bool IsSpace(char c) { return c == ' ' || c == '\n' || c == '\r' || c == '\t'; }
+  void Space() {
+    while (_p != _end && IsSpace(*_p)) ++_p;
+  }
+  bool Take(char c) {
+    if (_p == _end || *_p != c) return false;
+    ++_p;
+    return true;
+  }
+  bool Colon() {
+    Space();
+    if (!Take(':')) return false;
+    Space();
+    return true;
+  }
+  // A literal or number that must be exactly iWord, followed by what may follow a value.
+  bool Literal(const char* iWord) {
+    const std::size_t n = std::strlen(iWord);
+    if (static_cast<std::size_t>(_end - _p) < n || std::memcmp(_p, iWord, n) != 0) return false;
+    _p += n;
+    return _p == _end || IsSpace(*_p) || *_p == ',' || *_p == '}' || *_p == ']';
+  }
+  // A string without \u escapes, into oText.
+  bool String(std::string& oText) {
+    if (!Take('"')) return false;
+    oText.clear();
+    bool ascii = true;
+    const char* run = _p;
+    for (;;) {
+      if (_p == _end) return false;
+      const unsigned char c = static_cast<unsigned char>(*_p);
+      if (c == '"') break;
+      if (c < 0x20) return false;
+      if (c >= 0x80) ascii = false;
+      if (c != '\\') {
+        ++_p;
+        continue;
+      }
+      oText.append(run, _p);
+      if (++_p == _end) return false;
+      switch (*_p) {
+      case '"': oText += '"'; break;
+      case '\\': oText += '\\'; break;
+      case '/': oText += '/'; break;
+      case 'b': oText += '\b'; break;
+      case 'f': oText += '\f'; break;
+      case 'n': oText += '\n'; break;
+      case 'r': oText += '\r'; break;
+      case 't': oText += '\t'; break;
+      default: return false;
+      }
+      run = ++_p;
+    }
+    oText.append(run, _p);
+    ++_p;
+    return ascii || FirstBadUtf8(oText) == kNone;
+  }
+
+  // Inserts iKey into a map whose keys usually come in order (as saved); false when it is there.
+  template <class Map> typename Map::mapped_type* Insert(Map& ioMap, const std::string& iKey) {
+    if (ioMap.empty() || ioMap.rbegin()->first < iKey)
+      return &ioMap.emplace_hint(ioMap.end(), iKey, typename Map::mapped_type())->second;
+    auto [it, inserted] = ioMap.emplace(iKey, typename Map::mapped_type());
+    return inserted ? &it->second : nullptr;
+  }
+
+  bool Section(std::map<std::string, ZEPAppRepoEntries>& oRepos) {
+    if (!Take('{')) return false;
+    Space();
+    if (Take('}')) return true;
+    do {
+      Space();
+      if (!String(_key) || _key.empty() || !Colon()) return false;
+      ZEPAppRepoEntries* entries = Insert(oRepos, _key);
+      if (!entries || !Take('{')) return false;
+      Space();
+      if (Take('}')) continue;
+      do {
+        Space();
+        if (!String(_key) || _key.empty() || !Colon()) return false;
+        ZEPAppAttrEntry* entry = Insert(*entries, _key);
+        if (!entry || !Entry(*entry)) return false;
+        Space();
+      } while (Take(','));
+      if (!Take('}')) return false;
+      Space();
+    } while (Take(','));
+    return Take('}');
+  }
+
+  bool Entry(ZEPAppAttrEntry& oEntry) {
+    if (!Take('{')) return false;
+    bool locked = false, by = false;
+    Space();
+    if (!Take('}')) {
+      do {
+        Space();
+        if (!String(_field) || !Colon()) return false;
+        if (_field == "double" || _field == "int" || _field == "unsigned") {
+          if (oEntry.value) return false;
+          const bool ok = _field[0] == 'd'   ? Values<double>(oEntry)
+                          : _field[0] == 'i' ? Values<int>(oEntry)
+                                             : Values<unsigned int>(oEntry);
+          if (!ok) return false;
+        } else if (_field == "locked" && _admin && !locked) {
+          locked = true;
+          if (Literal("true")) oEntry.locked = true;
+          else if (!Literal("false")) return false;
+        } else if (_field == "by" && _admin && !by) {
+          by = true;
+          if (!String(oEntry.by)) return false;
+        } else return false;
+        Space();
+      } while (Take(','));
+      if (!Take('}')) return false;
+    }
+    return oEntry.value || oEntry.locked;
+  }
+
+  template <class T> bool Values(ZEPAppAttrEntry& oEntry) {
+    std::vector<T> values;
+    T v{};
+    if (Take('[')) {
+      Space();
+      if (!Take(']')) {
+        values.reserve(5);
+        do {
+          Space();
+          if (!Number(v)) return false;
+          values.push_back(v);
+          Space();
+        } while (Take(','));
+        if (!Take(']')) return false;
+      }
+    } else {
+      if (!Number(v)) return false;
+      values.push_back(v);
+    }
+    oEntry.value = std::move(values);
+    return true;
+  }
+
+  // A JSON number; oInteger: it has no fraction and no exponent.
+  bool Token(const char*& oStart, bool& oInteger) {
+    oStart = _p;
+    if (_p != _end && *_p == '-') ++_p;
+    if (_p == _end) return false;
+    if (*_p == '0') ++_p;
+    else if (*_p >= '1' && *_p <= '9')
+      while (_p != _end && *_p >= '0' && *_p <= '9') ++_p;
+    else return false;
+    oInteger = true;
+    if (_p != _end && *_p == '.') {
+      oInteger = false;
+      if (++_p == _end || *_p < '0' || *_p > '9') return false;
+      while (_p != _end && *_p >= '0' && *_p <= '9') ++_p;
+    }
+    if (_p != _end && (*_p == 'e' || *_p == 'E')) {
+      oInteger = false;
+      if (++_p != _end && (*_p == '+' || *_p == '-')) ++_p;
+      if (_p == _end || *_p < '0' || *_p > '9') return false;
+      while (_p != _end && *_p >= '0' && *_p <= '9') ++_p;
+    }
+    return true;
+  }
+  bool Number(double& oValue) {
+    const char* start;
+    bool integer;
+    if (!Token(start, integer)) return false;
+    if (integer) { // as the thorough pass: a 64-bit integer, then converted
+      if (*start == '-') {
+        std::int64_t i;
+        if (std::from_chars(start, _p, i).ec != std::errc()) return false;
+        oValue = static_cast<double>(i);
+      } else {
+        std::uint64_t u;
+        if (std::from_chars(start, _p, u).ec != std::errc()) return false;
+        oValue = static_cast<double>(u);
+      }
+      return true;
+    }
+    const auto r = std::from_chars(start, _p, oValue);
+    return r.ec == std::errc() && r.ptr == _p && std::isfinite(oValue);
+  }
+  template <class Int> bool Number(Int& oValue) {
+    const char* start;
+    bool integer;
+    if (!Token(start, integer) || !integer) return false;
+    if (std::from_chars(start, _p, oValue).ec == std::errc()) return true;
+    oValue = 0; // "-0" for an unsigned
+    return _p - start == 2 && start[0] == '-' && start[1] == '0';
+  }
+
+  const char* _p;
+  const char* const _end;
+  const bool _admin;
+  std::string _key, _field;
+};
+} // namespace
+
 std::vector<ZEPAppFileError> ParseSettingsText(const std::string& iText, const std::string& iPath, bool iAdmin,
                                                ZEPAppSettingsDoc& oDoc) {
+  oDoc = ZEPAppSettingsDoc();
+  const std::size_t start = SkipSpace(iText, BomLength(iText));
+  if (start == iText.size()) return {}; // a blank file is an empty one
+  if (QuickReader(iText, iAdmin).Document(oDoc)) return {};
+  return ParseSettingsTextThoroughly(iText, iPath, iAdmin, oDoc);
+}
+
+std::vector<ZEPAppFileError> ParseSettingsTextThoroughly(const std::string& iText, const std::string& iPath,
+                                                         bool iAdmin, ZEPAppSettingsDoc& oDoc) {
   oDoc = ZEPAppSettingsDoc();
   std::vector<std::pair<std::size_t, std::string>> faults;
   const std::size_t start = SkipSpace(iText, BomLength(iText));
@@ -472,49 +724,150 @@ std::string JsonPointer(const std::vector<std::string>& iKeys) {
   return pointer;
 }
 
+namespace {
+// Writes the settings text directly, in the layout of nlohmann's dump(2) that the files have
+// always had (two spaces per level, keys in the order of the maps, numbers as its serializer
+// writes them), so that stored files keep their bytes. One pass, no search per key.
+class SettingsWriter {
+public:
+  explicit SettingsWriter(std::string& oText) : _out(oText) {}
+
+  void Open(char iBracket) { _out += iBracket; ++_depth; _first = true; }
+  void Close(char iBracket) {
+    --_depth;
+    if (!_first) Newline();
+    _out += iBracket;
+    _first = false;
+  }
+  // Starts a member: "key": of the object open now.
+  void Key(const std::string& iKey) {
+    Next();
+    String(iKey);
+    _out += ": ";
+  }
+  // Starts an element of the array open now.
+  void Element() { Next(); }
+  void String(const std::string& iText) {
+    _out += '"';
+    for (char ch : iText) {
+      const unsigned char c = static_cast<unsigned char>(ch);
+      switch (c) {
+      case '"': _out += "\\\""; break;
+      case '\\': _out += "\\\\"; break;
+      case '\b': _out += "\\b"; break;
+      case '\f': _out += "\\f"; break;
+      case '\n': _out += "\\n"; break;
+      case '\r': _out += "\\r"; break;
+      case '\t': _out += "\\t"; break;
+      default:
+        if (c < 0x20) {
+          static const char kHex[] = "0123456789abcdef";
+          _out += "\\u00";
+          _out += kHex[c >> 4];
+          _out += kHex[c & 15];
+        } else _out += ch;
+      }
+    }
+    _out += '"';
+  }
+  void Number(double iValue) {
+    char buffer[64];
+    _out.append(buffer, nlohmann::detail::to_chars(buffer, buffer + sizeof buffer, iValue));
+  }
+  template <class Int> void Number(Int iValue) {
+    char buffer[24];
+    _out.append(buffer, std::to_chars(buffer, buffer + sizeof buffer, iValue).ptr);
+  }
+  void Bool(bool iValue) { _out += iValue ? "true" : "false"; }
+
+private:
+  void Next() {
+    if (!_first) _out += ',';
+    _first = false;
+    Newline();
+  }
+  void Newline() {
+    _out += '\n';
+    _out.append(2 * static_cast<std::size_t>(_depth), ' ');
+  }
+
+  std::string& _out;
+  int _depth = 0;
+  bool _first = true;
+};
+
+template <class T> const char* TypeName() {
+  return std::is_same_v<T, double> ? "double" : std::is_same_v<T, int> ? "int" : "unsigned";
+}
+} // namespace
+
 bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError) {
-  using ojson = nlohmann::ordered_json;
-  ojson root = ojson::object();
-  root["format"] = kSettingsFormat;
+  std::string text;
+  std::size_t attributes = 0;
+  for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference})
+    for (const auto& repo : iDoc.Of(kind)) attributes += repo.second.size();
+  text.reserve(64 + 96 * attributes);
+  SettingsWriter w(text);
+  w.Open('{');
+  w.Key("format");
+  w.Number(kSettingsFormat);
   for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference}) {
     const char* section = kind == ZEPAppRepoKind::Setting ? "settings" : "preferences";
-    ojson& out = root[section] = ojson::object();
+    w.Key(section);
+    w.Open('{');
     for (const auto& [repo, entries] : iDoc.Of(kind)) {
-      ojson attrs = ojson::object();
+      bool repoOpen = false; // a repository with nothing to write is left out
       for (const auto& [attr, entry] : entries) {
-        const std::string where = std::string(section) + "/" + repo + "/" + attr;
         if (FirstBadUtf8(repo) != kNone || FirstBadUtf8(attr) != kNone || FirstBadUtf8(entry.by) != kNone) {
-          oError = where + " cannot be saved: its name is not valid UTF-8";
+          oError = std::string(section) + "/" + repo + "/" + attr + " cannot be saved: its name is not valid UTF-8";
           return false;
         }
-        ojson e = ojson::object();
-        if (entry.value) {
-          std::size_t bad = 0;
-          if (!IsFinite(*entry.value, &bad)) {
-            oError = where + " cannot be saved: value " + std::to_string(bad + 1) + " is not a finite number";
-            return false;
-          }
+        std::size_t bad = 0;
+        if (entry.value && !IsFinite(*entry.value, &bad)) {
+          oError = std::string(section) + "/" + repo + "/" + attr + " cannot be saved: value " +
+                   std::to_string(bad + 1) + " is not a finite number";
+          return false;
+        }
+        const bool locked = iAdmin && entry.locked, by = iAdmin && !entry.by.empty();
+        if (!entry.value && !locked && !by) continue; // an attribute with nothing to write is left out
+        if (!repoOpen) {
+          w.Key(repo);
+          w.Open('{');
+          repoOpen = true;
+        }
+        w.Key(attr);
+        w.Open('{');
+        if (entry.value)
           std::visit(
               [&](const auto& values) {
                 using T = typename std::decay_t<decltype(values)>::value_type;
-                const char* type = std::is_same_v<T, double> ? "double" : std::is_same_v<T, int> ? "int" : "unsigned";
-                e[type] = values.size() == 1 ? ojson(values.front()) : ojson(values);
+                w.Key(TypeName<T>());
+                if (values.size() == 1) return w.Number(values.front());
+                w.Open('[');
+                for (T v : values) {
+                  w.Element();
+                  w.Number(v);
+                }
+                w.Close(']');
               },
               *entry.value);
+        if (locked) {
+          w.Key("locked");
+          w.Bool(true);
         }
-        if (iAdmin && entry.locked) e["locked"] = true;
-        if (iAdmin && !entry.by.empty()) e["by"] = entry.by;
-        if (!e.empty()) attrs[attr] = std::move(e);
+        if (by) {
+          w.Key("by");
+          w.String(entry.by);
+        }
+        w.Close('}');
       }
-      if (!attrs.empty()) out[repo] = std::move(attrs);
+      if (repoOpen) w.Close('}');
     }
+    w.Close('}');
   }
-  try {
-    oText = root.dump(2) + "\n";
-  } catch (const std::exception& ex) {
-    oError = std::string("cannot write the settings: ") + ex.what();
-    return false;
-  }
+  w.Close('}');
+  text += '\n';
+  oText = std::move(text);
   return true;
 }
 

@@ -80,6 +80,12 @@ inline constexpr int kSettingsFormat = 1;
 std::vector<ZEPAppFileError> ParseSettingsText(const std::string& iText, const std::string& iPath,
                                                bool iAdmin, ZEPAppSettingsDoc& oDoc);
 
+// The same answers as ParseSettingsText, from the pass that checks and places everything
+// (ParseSettingsText takes a quicker road for a file with nothing to report and comes here
+// otherwise). For tests that hold the two roads to the same answers.
+std::vector<ZEPAppFileError> ParseSettingsTextThoroughly(const std::string& iText, const std::string& iPath,
+                                                         bool iAdmin, ZEPAppSettingsDoc& oDoc);
+
 // Writes iDoc in the form above. False with oError when something cannot be written faithfully
 // (a NaN or infinity, a name that is not UTF-8); iAdmin keeps locks, else they are left out.
 bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError);
