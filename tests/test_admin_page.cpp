@@ -30,12 +30,7 @@ protected:
     return check && check->GetState() == ZEPDlgChecked;
   }
   bool Enabled(const std::string& iName) { return Control(iName)->IsEffectivelyEnabled(); }
-  std::vector<std::string> Hooks() {
-    std::vector<std::string> out;
-    for (const HookCall& c : _script.calls)
-      out.push_back(c.hook);
-    return out;
-  }
+  std::vector<std::string> Hooks() { return _script.Hooks(); }
   ZEPDlgDialog* PushBehavior() {
     EXPECT_TRUE(ZEPDlgDriver::Click(Control("pushPropTbBehavior")));
     return ZEPSysDynamicCast<ZEPDlgDialog>(ZEPDlgDriver::Find(_pPage, "dlgPropTbBehavior"));

@@ -56,12 +56,7 @@ protected:
     auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(Control(iName));
     return check ? check->GetState() == ZEPDlgChecked : radio->GetState() == ZEPDlgChecked;
   }
-  std::vector<std::string> Hooks() {
-    std::vector<std::string> out;
-    for (const HookCall& c : _script.calls)
-      out.push_back(c.hook);
-    return out;
-  }
+  std::vector<std::string> Hooks() { return _script.Hooks(); }
   HookScript _script;
   RecordingDisplayPage* _pPage = nullptr;
 };

@@ -51,12 +51,7 @@ protected:
     ZEPUnicodeString text;
     return StdCombo()->GetLine(text, StdCombo()->GetSelect()) < 0 ? "none" : text.str();
   }
-  Strings Hooks() {
-    Strings out;
-    for (const HookCall& c : _script.calls)
-      out.push_back(c.hook);
-    return out;
-  }
+  Strings Hooks() { return _script.Hooks(); }
   // The written value of iHook's last call: its text, or its first number.
   std::string Written(const char* iHook) {
     auto calls = _script.Calls(iHook);
