@@ -36,6 +36,12 @@ public:
   std::vector<HookCall> calls;
   std::vector<std::string> reads; // getters called, in order
 
+  // The hooks called, in order.
+  std::vector<std::string> Hooks() const {
+    std::vector<std::string> out;
+    for (const HookCall& c : calls) out.push_back(c.hook);
+    return out;
+  }
   std::vector<HookCall> Calls(const std::string& iHook) const {
     std::vector<HookCall> out;
     for (const HookCall& c : calls)

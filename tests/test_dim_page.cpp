@@ -91,18 +91,8 @@ const std::vector<const char*> kForce2D = {"_radioDimForce2DAlways", "_radioDimF
 } // namespace
 
 TEST_F(DimPage, ModuleHooksOnly) {
+  // The controls, their rows and states are in the dump.
   Open();
-  EXPECT_EQ(Selected(kCircle), "_radioDimCircleCenter");
-  EXPECT_TRUE(Spinner("editorDimLinePosValue")->IsEffectivelyEnabled());
-  // Optional controls the module's hooks leave out, and the origin section that is off by default.
-  for (const char* name : {"pushAssoc3D", "frameDimAssoc3D", "tmpFrame", "checkLineUpAutoFunnel",
-                           "frmDimOriented", "chkDimOriginSymb"})
-    EXPECT_EQ(Find(name), nullptr) << name;
-  EXPECT_NE(Find("checkDimDriveAuto"), nullptr);
-  EXPECT_EQ(Row("frameDimSketch"), 0);
-  EXPECT_EQ(Row("_frameMove"), 1);
-  EXPECT_EQ(Row("_frameLineUp"), 2);
-  EXPECT_EQ(Row("frm"), 4);
   // The approximate flag is read after the line-up values.
   EXPECT_EQ(_script.reads,
             (std::vector<std::string>{
@@ -129,9 +119,6 @@ TEST_F(DimPage, AllInfoHooksAnsweringZeroWithEveryLayoutOption) {
   ExpectGolden("dim_page_info_zero.dump", ZEPDlgDriver::Dump(_pPage));
   ZEPDlgDialog* dialog = PushAssoc3D();
   ASSERT_NE(dialog, nullptr);
-  EXPECT_EQ(dialog->GetTitle().str(),
-            ZEPMsgCatalog::BuildMessage("ZEP2DBaseOptDimFrm", "dimAssocWnd.Title").str());
-  EXPECT_FALSE(dialog->GetTitle().str().empty());
   ExpectGolden("dim_page_assoc_dialog.dump", ZEPDlgDriver::Dump(dialog));
 }
 
@@ -173,13 +160,7 @@ TEST_F(DimPage, LayoutOptions) {
   _script.options = {
       {"WithFrmCreateDriveAndChamfer", 1}, {"WithLineUpValues", 1}, {"WithFrmDimOrigin", 1}};
   _script.values["DimOriginSymb"] = {1};
-  Open();
-  for (const char* name : {"checkDimDriveAuto", "chkDetectChamfer", "_editorLineUpBaseOffsetAngle",
-                           "_editorLineUpOffsetLength", "chkDimOriginSymb"})
-    EXPECT_NE(Control(name), nullptr) << name;
-  EXPECT_EQ(Row("frmDimOriented"), 3);
-  EXPECT_EQ(Find("frmDimOriented")->GetIconName(), "I_TPSDimOriented");
-  EXPECT_TRUE(Checked("chkDimOriginSymb"));
+  Open(); // the controls it builds are in the all-info dump
   ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkDimOriginSymb")));
   ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkDetectChamfer")));
   EXPECT_EQ(Written("SetSysDimOriginSymb"), std::vector<double>{0});
@@ -187,22 +168,34 @@ TEST_F(DimPage, LayoutOptions) {
   EXPECT_EQ(_script.calls.size(), 2u);
 }
 
-TEST_F(DimPage, CircleRadiosShowAndWriteOnChangeOnly) {
+// Each radio group shows its stored value (an unknown one as the last-listed default); clicking
+// the radio already on writes nothing, each switch writes once.
+TEST_F(DimPage, RadioGroupsShowTheStoredValueAndWriteOnChangeOnly) {
+  _script.info["DimAssoc3DMod"] = 0;
   const struct {
+    const char* attribute;
+    const std::vector<const char*>& radios;
+    bool inDialog;
     int stored;
     const char* selected;
-  } shown[] = {{1, "_radioDimCircleEdge"},
-               {0, "_radioDimCircleCenter"},
-               {2, "_radioDimCircleCenter"},
-               {-1, "_radioDimCircleCenter"}};
+  } shown[] = {{"DimCreateCircle", kCircle, false, 1, "_radioDimCircleEdge"},
+               {"DimCreateCircle", kCircle, false, 0, "_radioDimCircleCenter"},
+               {"DimCreateCircle", kCircle, false, -1, "_radioDimCircleCenter"},
+               {"DimAssoc3DMod", kForce2D, true, 2, "_radioDimForce2DAlways"},
+               {"DimAssoc3DMod", kForce2D, true, 1, "_radioDimForce2DWhenPb"},
+               {"DimAssoc3DMod", kForce2D, true, 0, "_radioDimForce2DNever"},
+               {"DimAssoc3DMod", kForce2D, true, 5, "_radioDimForce2DNever"},
+               {"DimCreateCircle", kCircle, false, 2, "_radioDimCircleCenter"}};
   for (const auto& s : shown) {
-    _script.values["DimCreateCircle"] = {double(s.stored)};
+    _script.values[s.attribute] = {double(s.stored)};
     Open();
-    EXPECT_EQ(Selected(kCircle), s.selected) << s.stored;
+    if (s.inDialog) {
+      ASSERT_NE(PushAssoc3D(), nullptr);
+    }
+    EXPECT_EQ(Selected(s.radios), s.selected) << s.attribute << " " << s.stored;
   }
   EXPECT_TRUE(_script.calls.empty());
-
-  // Stored 2 shows the centre: clicking it writes nothing, each switch writes once.
+  // Stored 2 shows the centre.
   for (const char* click : {"_radioDimCircleCenter", "_radioDimCircleEdge", "_radioDimCircleEdge",
                             "_radioDimCircleCenter", "_radioDimCircleCenter"})
     ASSERT_TRUE(ZEPDlgDriver::Click(Radio(click))) << click;
@@ -213,6 +206,14 @@ TEST_F(DimPage, CircleRadiosShowAndWriteOnChangeOnly) {
   _script.values["DimCreateCircle"] = {1};
   _pPage->Initialize();
   EXPECT_EQ(Selected(kCircle), "_radioDimCircleEdge");
+  // Stored 5 shows Never: clicking it writes nothing, the first switch writes.
+  _script.calls.clear();
+  _script.values["DimAssoc3DMod"] = {5};
+  Open();
+  ASSERT_NE(PushAssoc3D(), nullptr);
+  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("_radioDimForce2DNever")));
+  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("_radioDimForce2DWhenPb")));
+  EXPECT_EQ(Written("SetSysDimAssoc3DMod"), std::vector<double>{1});
 }
 
 TEST_F(DimPage, FollowingTheCursorDisablesTheLinePosition) {
@@ -388,28 +389,6 @@ TEST_F(DimPage, Assoc3DDialogPressedTwiceStaysOne) {
   EXPECT_EQ(Dialogs().size(), 1u);
 }
 
-TEST_F(DimPage, Force2DRadiosShowTheStoredMode) {
-  _script.info["DimAssoc3DMod"] = 0;
-  const struct {
-    int stored;
-    const char* selected;
-  } shown[] = {{2, "_radioDimForce2DAlways"},
-               {1, "_radioDimForce2DWhenPb"},
-               {0, "_radioDimForce2DNever"},
-               {5, "_radioDimForce2DNever"}};
-  for (const auto& s : shown) {
-    _script.values["DimAssoc3DMod"] = {double(s.stored)};
-    Open();
-    ASSERT_NE(PushAssoc3D(), nullptr);
-    EXPECT_EQ(Selected(kForce2D), s.selected) << s.stored;
-  }
-  // Stored 5 shows Never: clicking it writes nothing, the first switch writes.
-  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("_radioDimForce2DNever")));
-  EXPECT_TRUE(_script.calls.empty());
-  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("_radioDimForce2DWhenPb")));
-  EXPECT_EQ(Written("SetSysDimAssoc3DMod"), std::vector<double>{1});
-}
-
 TEST_F(DimPage, LocksInsideTheAssoc3DDialog) {
   // Only the mode has lock information; the approximate flag's hook leaves its record alone.
   _script.info["DimAssoc3DMod"] = 0;
@@ -452,14 +431,10 @@ TEST_F(DimPage, RegisteredWithTheObjectModel) {
   ASSERT_NE(meta, nullptr);
   EXPECT_EQ(meta, ZEP2DBaseOptDimFrm::MetaObject());
   EXPECT_EQ(meta->GetBase(), ZEPDlgFrame::MetaObject());
-  EXPECT_STREQ(meta->GetExtendedType(), "ZEPNull");
   EXPECT_STREQ(meta->GetFramework(), "DraftingBaseSettings");
   EXPECT_EQ(meta->CreateInstance(), nullptr);
-
   EXPECT_EQ(_pPage->GetMetaObject(), meta);
-  EXPECT_STREQ(_pPage->IsA(), "ZEP2DBaseOptDimFrm");
   EXPECT_EQ(_pPage->IsAKindOf("ZEPDlgFrame"), 1);
-  EXPECT_EQ(_pPage->IsAKindOf("ZEP2DBaseOptDimFrm"), 1);
   EXPECT_EQ(_pPage->IsAKindOf("ZEPDlgDialog"), 0);
   EXPECT_EQ(ZEPSysDynamicCast<ZEP2DBaseOptDimFrm>(static_cast<ZEPBaseUnknown*>(_pPage)), _pPage);
   EXPECT_EQ(ZEPSysDynamicCast<ZEP2DBaseOptDimFrm>(static_cast<ZEPBaseUnknown*>(_pWindow)), nullptr);

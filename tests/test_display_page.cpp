@@ -56,12 +56,7 @@ protected:
     auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(Control(iName));
     return check ? check->GetState() == ZEPDlgChecked : radio->GetState() == ZEPDlgChecked;
   }
-  std::vector<std::string> Hooks() {
-    std::vector<std::string> out;
-    for (const HookCall& c : _script.calls)
-      out.push_back(c.hook);
-    return out;
-  }
+  std::vector<std::string> Hooks() { return _script.Hooks(); }
   HookScript _script;
   RecordingDisplayPage* _pPage = nullptr;
 };
@@ -71,15 +66,7 @@ TEST_F(DisplayPage, ModuleHooksBuildOnlyTheControlsThatNeedNoAnswer) {
   _script.options["FirstRow"] = 3;
   Open();
   EXPECT_EQ(_pPage->nextRow, 7);
-  EXPECT_EQ(Find("frameTree")->GetGridConstraints().row, 3);
-  for (const char* absent : {"checkTrackHistory", "checkParameters", "checkHideIn3DStatus",
-                             "checkAnnotInSpecTreeAnnotSet", "invLock1", "checkVisualizationDiag",
-                             "diagGeometriesColorsPushButton"})
-    EXPECT_EQ(Find(absent), nullptr) << absent;
-  for (const char* present : {"labelDisplay", "invLock", "checkDesignMode", "chkPropagateHighlight",
-                              "radCappingPatternMaterial", "cmbCappingColor"})
-    EXPECT_NE(Find(present), nullptr) << present;
-  EXPECT_FALSE(Control("diagElementsColorsPushButton")->IsEffectivelyEnabled());
+  // Which controls are built, where and in which state, is in the dump.
   EXPECT_EQ(_script.reads.size(), 69u);
   EXPECT_TRUE(_script.calls.empty());
   ExpectGolden("display_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));

@@ -60,14 +60,9 @@ TEST_F(LockControls, NamesCellsAndInnerControl) {
   ZEPSettingInfo info;
   auto* check = new ZEPDrwLockCheckButton(&_root, "checkGrid", info, 0);
   ASSERT_NE(check->GetDialog(), nullptr);
-  EXPECT_EQ(check->GetOwnName(), "checkGrid");
-  EXPECT_EQ(check->GetDialog()->GetOwnName(), "checkGrid_dialog");
+  // The names and cells of padlock and inner control are in the dump below.
   EXPECT_EQ(check->GetName(), "checkGrid_dialog");
-  EXPECT_EQ(check->GetLock()->GetOwnName(), "checkGridLock");
-  EXPECT_EQ(ZEPDlgDriver::Find(&_root, "checkGrid_dialog"), check->GetDialog());
-  EXPECT_EQ(check->GetLock()->GetGridConstraints().column, 0);
   EXPECT_EQ(check->GetLock()->GetGridConstraints().justification, 0x1Eu);
-  EXPECT_EQ(check->GetDialog()->GetGridConstraints().column, 1);
   EXPECT_EQ(check->GetDialog()->GetGridConstraints().justification, 0x58u);
 
   auto* frame = new ZEPDrwLockFrame(&_root, "frameGroup", info, 0x80001);
