@@ -15,6 +15,10 @@
 // Widget names and icon names.
 using ZEPString = std::string;
 
+// Offset of the first byte of iText that does not belong to well-formed UTF-8 (no overlong
+// forms, surrogates or code points above U+10FFFF), or std::string::npos when all of it does.
+std::size_t ZEPFirstBadUtf8(const std::string& iText);
+
 // User-visible text, stored as UTF-8. Character counts are code points.
 class ZEPUnicodeString {
 public:

@@ -71,6 +71,11 @@ template <class R> R* OpenIn(const std::string& iName) {
   return slot.get();
 }
 
+// What a repository can keep of a text: UTF-8 without NUL bytes (the files hold JSON strings).
+bool IsStorableText(const std::string& iText) {
+  return iText.find('\0') == std::string::npos && ZEPFirstBadUtf8(iText) == std::string::npos;
+}
+
 template <class T> std::vector<T> const* As(const ZEPSysSettingRepository::Value* v) {
   return v ? std::get_if<std::vector<T>>(v) : nullptr;
 }
@@ -110,7 +115,10 @@ template <class T> int ZEPSysSettingRepository::Write(const char* iName, const T
     for (int i = 0; i < iCount; ++i)
       if (!std::isfinite(iValues[i])) return 0; // no NaN or infinity ever reaches a store
   }
-  std::vector<T> values(iValues, iValues + iCount);
+  return Store(iName, std::vector<T>(iValues, iValues + iCount));
+}
+
+template <class T> int ZEPSysSettingRepository::Store(const char* iName, std::vector<T>&& values) {
   auto it = _user.find(iName);
   if (it != _user.end()) {
     const std::vector<T>* old = std::get_if<std::vector<T>>(&it->second);
@@ -127,6 +135,20 @@ int ZEPSysSettingRepository::ReadAttr(const char* n, unsigned int* v, int c) con
 int ZEPSysSettingRepository::WriteAttr(const char* n, const double* v, int c) { return Write(n, v, c); }
 int ZEPSysSettingRepository::WriteAttr(const char* n, const int* v, int c) { return Write(n, v, c); }
 int ZEPSysSettingRepository::WriteAttr(const char* n, const unsigned int* v, int c) { return Write(n, v, c); }
+
+int ZEPSysSettingRepository::ReadAttr(const char* iName, std::vector<std::string>& oTexts) const {
+  const std::vector<std::string>* stored = iName ? As<std::string>(Effective(iName)) : nullptr;
+  if (!stored) return -1;
+  oTexts = *stored;
+  return static_cast<int>(stored->size());
+}
+
+int ZEPSysSettingRepository::WriteAttr(const char* iName, const std::vector<std::string>& iTexts) {
+  if (!iName || !*iName || IsLocked(iName)) return 0;
+  for (const std::string& text : iTexts)
+    if (!IsStorableText(text)) return 0;
+  return Store(iName, std::vector<std::string>(iTexts));
+}
 
 long ZEPSysSettingRepository::SaveRepository(const char*) {
   if (!_modified) return S_OK;

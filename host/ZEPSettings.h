@@ -60,7 +60,8 @@ private:
 // attribute reads the administrator's value and refuses writes.
 class ZEPSysSettingRepository {
 public:
-  using Value = std::variant<std::vector<double>, std::vector<int>, std::vector<unsigned int>>;
+  // Numbers, or texts (one text, or a list of texts that may be empty).
+  using Value = std::variant<std::vector<double>, std::vector<int>, std::vector<unsigned int>, std::vector<std::string>>;
   struct Lock {
     bool locked = false;
     std::string text; // who and where
@@ -89,6 +90,10 @@ public:
   int WriteAttr(const char* iName, const double* iValues, int iCount = 1);
   int WriteAttr(const char* iName, const int* iValues, int iCount = 1);
   int WriteAttr(const char* iName, const unsigned int* iValues, int iCount = 1);
+  // Texts: the number of texts read, -1 when the attribute holds no texts (oTexts unchanged).
+  int ReadAttr(const char* iName, std::vector<std::string>& oTexts) const;
+  // 1 on success; 0 when refused (locked attribute, no name, a text that is not UTF-8 or holds a NUL).
+  int WriteAttr(const char* iName, const std::vector<std::string>& iTexts);
   // Negative on failure. Nothing to save (no change since the last save) is a success.
   long SaveRepository(const char* iName = nullptr);
 
@@ -118,6 +123,7 @@ public:
 protected:
   template <class T> int Read(const char* iName, T* oValues, int iCount) const;
   template <class T> int Write(const char* iName, const T* iValues, int iCount);
+  template <class T> int Store(const char* iName, std::vector<T>&& iValues);
 
 private:
   std::string _name;

@@ -22,6 +22,36 @@ std::vector<size_t> CharStarts(const std::string& s) {
 }
 } // namespace
 
+std::size_t ZEPFirstBadUtf8(const std::string& t) {
+  const auto* s = reinterpret_cast<const unsigned char*>(t.data());
+  const std::size_t n = t.size();
+  std::size_t i = 0;
+  while (i < n) {
+    unsigned char c = s[i];
+    if (c < 0x80) {
+      ++i;
+      continue;
+    }
+    int len = 0;
+    unsigned char lo = 0x80, hi = 0xBF; // allowed range of the second byte
+    if (c >= 0xC2 && c <= 0xDF) len = 2;
+    else if (c >= 0xE0 && c <= 0xEF) {
+      len = 3;
+      if (c == 0xE0) lo = 0xA0;
+      if (c == 0xED) hi = 0x9F;
+    } else if (c >= 0xF0 && c <= 0xF4) {
+      len = 4;
+      if (c == 0xF0) lo = 0x90;
+      if (c == 0xF4) hi = 0x8F;
+    } else return i;
+    if (i + 1 >= n || s[i + 1] < lo || s[i + 1] > hi) return i;
+    for (int k = 2; k < len; ++k)
+      if (i + k >= n || (s[i + k] & 0xC0) != 0x80) return i;
+    i += len;
+  }
+  return std::string::npos;
+}
+
 int ZEPUnicodeString::GetLengthInChar() const { return static_cast<int>(CharStarts(_sText).size()); }
 
 ZEPUnicodeString ZEPUnicodeString::SubString(int iStart, int iLength) const {

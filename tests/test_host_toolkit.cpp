@@ -174,6 +174,20 @@ TEST_F(HostToolkit, RepositoryReadsKeepDefaultsAndLocksRefuseWrites) {
   double nan = std::nan("");
   EXPECT_EQ(rep->WriteAttr("Spacing", &nan, 1), 0);
 
+  // Texts: a list may be empty; text read from numbers reads nothing; bad UTF-8 and NUL refused.
+  std::vector<std::string> texts{"keep"};
+  EXPECT_EQ(rep->ReadAttr("Spacing", texts), -1);
+  EXPECT_EQ(texts, std::vector<std::string>{"keep"});
+  EXPECT_EQ(rep->WriteAttr("Standards", std::vector<std::string>{}), 1);
+  EXPECT_EQ(rep->ReadAttr("Standards", texts), 0);
+  EXPECT_TRUE(texts.empty());
+  EXPECT_EQ(rep->WriteAttr("Standards", std::vector<std::string>{"ISO", "Entreprise \xc3\xa9"}), 1);
+  EXPECT_EQ(rep->WriteAttr("Standards", std::vector<std::string>{"ok", "bad \xc3"}), 0);
+  EXPECT_EQ(rep->WriteAttr("Standards", std::vector<std::string>{std::string("a\0b", 3)}), 0);
+  EXPECT_EQ(rep->ReadAttr("Standards", texts), 2);
+  EXPECT_EQ(texts[1], "Entreprise \xc3\xa9");
+  EXPECT_EQ(rep->ReadAttr("Standards", spacing, 5), 0);
+
   int unit = 5;
   rep->SetDefault("DrwPaperLengthUnit", std::vector<int>{3});
   int read = 0;

@@ -27,7 +27,12 @@ protected:
 Values Stored(const ZEPSysSettingRepository* iRep, const std::string& iName) {
   Values out;
   if (const auto* v = iRep->Effective(iName))
-    std::visit([&](const auto& vec) { out.assign(vec.begin(), vec.end()); }, *v);
+    std::visit(
+        [&](const auto& vec) {
+          if constexpr (std::is_arithmetic_v<typename std::decay_t<decltype(vec)>::value_type>)
+            out.assign(vec.begin(), vec.end());
+        },
+        *v);
   return out;
 }
 

@@ -34,38 +34,6 @@ std::size_t SkipSpace(const std::string& t, std::size_t i) {
   return i;
 }
 
-// Offset of the first byte that does not belong to well-formed UTF-8 (no overlong forms,
-// surrogates or code points above U+10FFFF), or kNone.
-std::size_t FirstBadUtf8(const std::string& t) {
-  const auto* s = reinterpret_cast<const unsigned char*>(t.data());
-  const std::size_t n = t.size();
-  std::size_t i = 0;
-  while (i < n) {
-    unsigned char c = s[i];
-    if (c < 0x80) {
-      ++i;
-      continue;
-    }
-    int len = 0;
-    unsigned char lo = 0x80, hi = 0xBF; // allowed range of the second byte
-    if (c >= 0xC2 && c <= 0xDF) len = 2;
-    else if (c >= 0xE0 && c <= 0xEF) {
-      len = 3;
-      if (c == 0xE0) lo = 0xA0;
-      if (c == 0xED) hi = 0x9F;
-    } else if (c >= 0xF0 && c <= 0xF4) {
-      len = 4;
-      if (c == 0xF0) lo = 0x90;
-      if (c == 0xF4) hi = 0x8F;
-    } else return i;
-    if (i + 1 >= n || s[i + 1] < lo || s[i + 1] > hi) return i;
-    for (int k = 2; k < len; ++k)
-      if (i + k >= n || (s[i + k] & 0xC0) != 0x80) return i;
-    i += len;
-  }
-  return kNone;
-}
-
 // Offset where nesting first goes deeper than kMaxDepth, or kNone. Strings are skipped.
 std::size_t TooDeep(const std::string& t) {
   int depth = 0;
@@ -504,7 +472,7 @@ private:
     }
     oText.append(run, _p);
     ++_p;
-    return ascii || FirstBadUtf8(oText) == kNone;
+    return ascii || ZEPFirstBadUtf8(oText) == kNone;
   }
 
   // Inserts iKey into a map whose keys usually come in order (as saved); false when it is there.
@@ -665,7 +633,7 @@ std::vector<ZEPAppFileError> ParseSettingsTextThoroughly(const std::string& iTex
   const std::size_t start = SkipSpace(iText, BomLength(iText));
   if (start == iText.size()) return {}; // a blank file is an empty one
 
-  const std::size_t bad = FirstBadUtf8(iText);
+  const std::size_t bad = ZEPFirstBadUtf8(iText);
   if (bad != kNone) {
     char byte[8];
     std::snprintf(byte, sizeof byte, "0x%02X", static_cast<unsigned char>(iText[bad]));
@@ -774,6 +742,7 @@ public:
     char buffer[64];
     _out.append(buffer, nlohmann::detail::to_chars(buffer, buffer + sizeof buffer, iValue));
   }
+  void Number(const std::string& iText) { String(iText); } // a text among the values
   template <class Int> void Number(Int iValue) {
     char buffer[24];
     _out.append(buffer, std::to_chars(buffer, buffer + sizeof buffer, iValue).ptr);
@@ -797,7 +766,10 @@ private:
 };
 
 template <class T> const char* TypeName() {
-  return std::is_same_v<T, double> ? "double" : std::is_same_v<T, int> ? "int" : "unsigned";
+  return std::is_same_v<T, double>         ? "double"
+         : std::is_same_v<T, int>          ? "int"
+         : std::is_same_v<T, unsigned int> ? "unsigned"
+                                           : "text";
 }
 } // namespace
 
@@ -818,7 +790,7 @@ bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string&
     for (const auto& [repo, entries] : iDoc.Of(kind)) {
       bool repoOpen = false; // a repository with nothing to write is left out
       for (const auto& [attr, entry] : entries) {
-        if (FirstBadUtf8(repo) != kNone || FirstBadUtf8(attr) != kNone || FirstBadUtf8(entry.by) != kNone) {
+        if (ZEPFirstBadUtf8(repo) != kNone || ZEPFirstBadUtf8(attr) != kNone || ZEPFirstBadUtf8(entry.by) != kNone) {
           oError = std::string(section) + "/" + repo + "/" + attr + " cannot be saved: its name is not valid UTF-8";
           return false;
         }
@@ -844,7 +816,7 @@ bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string&
                 w.Key(TypeName<T>());
                 if (values.size() == 1) return w.Number(values.front());
                 w.Open('[');
-                for (T v : values) {
+                for (const T& v : values) {
                   w.Element();
                   w.Number(v);
                 }

@@ -119,7 +119,13 @@ std::vector<ZEPAppAttrRule> AppSettingRules() {
     if (flag || known != KnownLimits().end()) {
       const Limits limits = known != KnownLimits().end() ? known->second : Limits{0, 1, false, false};
       rule.check = [limits, flag](const ZEPAppValue& iValue) {
-        return std::visit([&](const auto& values) { return CheckEach(values, limits, flag); }, iValue);
+        return std::visit(
+            [&](const auto& values) -> std::string {
+              using T = typename std::decay_t<decltype(values)>::value_type;
+              if constexpr (std::is_same_v<T, std::string>) return "a text where a number is expected";
+              else return CheckEach(values, limits, flag);
+            },
+            iValue);
       };
     }
     rules.push_back(std::move(rule));
