@@ -22,6 +22,7 @@ struct PLMState {
   bool withCommand = true;
   int created = 0;
   std::vector<ZEPIPLMChooser*> choosers; // alive, in creation order
+  std::vector<ZEPPLMSetup::Standard> repository;
 };
 PLMState& State() {
   static PLMState state;
@@ -198,7 +199,21 @@ bool ZEPPLMSetup::Cancel() {
   return true;
 }
 
+void ZEPPLMSetup::SetRepository(std::vector<Standard> iStandards) {
+  State().repository = std::move(iStandards);
+}
+
+const std::vector<ZEPPLMSetup::Standard>& ZEPPLMSetup::Repository() { return State().repository; }
+
+std::vector<ZEPPLMSetup::Standard> ZEPPLMSetup::Listed(const ZEPIPLMChooser* iChooser) {
+  if (!iChooser) return {};
+  const std::vector<std::string>& types = iChooser->GetTypeNames();
+  if (std::find(types.begin(), types.end(), "DIFStandardRep") == types.end()) return {};
+  return State().repository;
+}
+
 void ZEPPLMSetup::Reset() {
+  State().repository.clear();
   State().factory = true;
   State().creationFails = false;
   State().withCommand = true;

@@ -228,6 +228,14 @@ public:
   static bool Validate(const std::vector<Standard>& iChosen);
   static bool Cancel();
 
+  // The standards of the PLM repository, as the chooser lists them to the user (the
+  // application reads them from its repository file). Empty by default.
+  static void SetRepository(std::vector<Standard> iStandards);
+  static const std::vector<Standard>& Repository();
+  // What a chooser offers the user: the repository's standards once it was asked for the
+  // drafting standard type ("DIFStandardRep"), else nothing.
+  static std::vector<Standard> Listed(const ZEPIPLMChooser* iChooser);
+
   // The defaults; objects alive are left to their holders.
   static void Reset();
 };

@@ -8,8 +8,11 @@ namespace zepapp {
 const std::vector<ZEPAppSetting>& AppSettings() {
   static const std::vector<ZEPAppSetting> settings = {
 #define ZEP_APP_SETTING(Page, Attribute, Control, Repository, Stored, ...)                          \
-  {#Page, #Attribute, Control, Repository, Stored, {__VA_ARGS__}},
+  {#Page, #Attribute, Control, Repository, Stored, {__VA_ARGS__}, false, {}},
+#define ZEP_APP_TEXT_SETTING(Page, Attribute, Control, Repository, Stored, ...)                     \
+  {#Page, #Attribute, Control, Repository, Stored, {}, true, {__VA_ARGS__}},
 #include "ZEPAppSettings.def"
+#undef ZEP_APP_TEXT_SETTING
 #undef ZEP_APP_SETTING
   };
   return settings;
@@ -52,11 +55,35 @@ template <class T, class S> T FromStored(S iValue) {
 }
 } // namespace
 
+namespace {
+// A text setting as the repository keeps it: one text, or the texts of a list in order.
+std::vector<std::string> ToTexts(const ZEPUnicodeString& iText) { return {iText.str()}; }
+std::vector<std::string> ToTexts(const ZEPListValZEPUnicodeString& iList) {
+  std::vector<std::string> texts;
+  for (const ZEPUnicodeString& t : iList.Items()) texts.push_back(t.str());
+  return texts;
+}
+void FromTexts(const std::vector<std::string>& iTexts, ZEPUnicodeString& oText) {
+  oText = iTexts.empty() ? ZEPUnicodeString() : ZEPUnicodeString(iTexts.front());
+}
+void FromTexts(const std::vector<std::string>& iTexts, ZEPListValZEPUnicodeString& oList) {
+  oList.RemoveAll(1);
+  for (const std::string& t : iTexts) oList.Append(ZEPUnicodeString(t));
+}
+} // namespace
+
 template <class T> long ZEPAppBinding::Read(const ZEPAppSetting* setting, T* oValues, int iCount) {
   constexpr ZEPAppStored kind = StoredOf<T>();
   if constexpr (kind == ZEPAppStored::Unsupported) {
     (void)setting, (void)oValues, (void)iCount;
     return E_NOTIMPL;
+  } else if constexpr (kind == ZEPAppStored::Text || kind == ZEPAppStored::TextList) {
+    if (!setting || !oValues || iCount != 1) return E_FAIL;
+    // The default first; the repository's texts replace it when it holds texts.
+    std::vector<std::string> texts = setting->texts;
+    if (ZEPSysSettingRepository* rep = Repository(*setting)) rep->ReadAttr(setting->stored.c_str(), texts);
+    FromTexts(texts, *oValues);
+    return S_OK;
   } else {
     using S = typename StoredType<kind>::type;
     if (!setting || !oValues || iCount <= 0) return E_FAIL;
@@ -75,6 +102,13 @@ template <class T> long ZEPAppBinding::Write(const ZEPAppSetting* setting, const
   if constexpr (kind == ZEPAppStored::Unsupported) {
     (void)setting, (void)iValues, (void)iCount;
     return E_NOTIMPL;
+  } else if constexpr (kind == ZEPAppStored::Text || kind == ZEPAppStored::TextList) {
+    if (!setting || !iValues || iCount != 1) return E_FAIL;
+    ZEPSysSettingRepository* rep = Repository(*setting);
+    // Refused when locked, or for a text that is not UTF-8 or holds a NUL.
+    if (!rep || rep->WriteAttr(setting->stored.c_str(), ToTexts(*iValues)) != 1) return E_FAIL;
+    if (WriteObserver()) WriteObserver()(*setting);
+    return S_OK;
   } else {
     using S = typename StoredType<kind>::type;
     if (!setting || !iValues || iCount <= 0) return E_FAIL;

@@ -12,17 +12,21 @@
 namespace zepapp {
 
 // How a page's values are kept in a repository: flags and ints as int, unsigned ints as
-// unsigned, lengths and angles as double (the sketcher reads the same attributes).
-enum class ZEPAppStored { Int, UInt, Double, Unsupported };
+// unsigned, lengths and angles as double (the sketcher reads the same attributes), a text
+// (Text) or a list of texts (TextList) as texts.
+enum class ZEPAppStored { Int, UInt, Double, Text, TextList, Unsupported };
 
 template <class T> constexpr ZEPAppStored StoredOf() {
   if constexpr (std::is_same_v<T, double>) return ZEPAppStored::Double;
   else if constexpr (std::is_same_v<T, unsigned int>) return ZEPAppStored::UInt;
   else if constexpr (std::is_same_v<T, int> || std::is_same_v<T, unsigned char>) return ZEPAppStored::Int;
+  else if constexpr (std::is_same_v<T, ZEPUnicodeString>) return ZEPAppStored::Text;
+  else if constexpr (std::is_same_v<T, ZEPListValZEPUnicodeString>) return ZEPAppStored::TextList;
   else return ZEPAppStored::Unsupported;
 }
 
-// One row of ZEPAppSettings.def.
+// One row of ZEPAppSettings.def: ZEP_APP_SETTING rows have numbers as defaults,
+// ZEP_APP_TEXT_SETTING rows texts (one text, or the texts of a list).
 struct ZEPAppSetting {
   std::string page;       // "Grid"
   std::string attribute;  // "PrimSpaceH"
@@ -30,6 +34,8 @@ struct ZEPAppSetting {
   std::string repository; // "DrwSketcherSpecific"
   std::string stored;     // "Drw_settings_GridPrimarySpacing"
   std::vector<double> defaults;
+  bool text = false;                 // a ZEP_APP_TEXT_SETTING row
+  std::vector<std::string> texts;    // its default texts
 };
 
 const std::vector<ZEPAppSetting>& AppSettings();
@@ -41,7 +47,9 @@ struct ZEPAppSettingKey {
 };
 inline constexpr ZEPAppSettingKey kAppSettingKeys[] = {
 #define ZEP_APP_SETTING(Page, Attribute, ...) {#Page, #Attribute},
+#define ZEP_APP_TEXT_SETTING(Page, Attribute, ...) {#Page, #Attribute},
 #include "ZEPAppSettings.def"
+#undef ZEP_APP_TEXT_SETTING
 #undef ZEP_APP_SETTING
 };
 inline constexpr int kAppSettingCount = static_cast<int>(std::size(kAppSettingKeys));

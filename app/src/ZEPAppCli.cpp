@@ -7,6 +7,7 @@
 #include "ZEPAppSettingsFile.h"
 #include "ZEPAppSettingsRules.h"
 #include "ZEPAppSketcher.h"
+#include "ZEPAppStandards.h"
 
 #include <CLI/CLI.hpp>
 #include <nlohmann/json.hpp>
@@ -44,7 +45,7 @@ std::string ScaleName(int iRange) {
 
 // What the command line asked for.
 struct Request {
-  std::string settings, admin;
+  std::string settings, admin, standards, plm;
   std::string page, control, value, attribute, html;
   std::vector<std::string> pages;
   std::vector<std::string> args; // a setting's key, then its value where one is taken
@@ -89,31 +90,82 @@ const char* KindName(ZEPAppKind iKind) {
     return "choice";
   case ZEPAppKind::Push:
     return "button";
+  case ZEPAppKind::Editor:
+    return "editor";
   case ZEPAppKind::Other:
     break;
   }
   return "other";
 }
 
-// The values a repository reads for an attribute, as JSON numbers; null when it has none.
+// Whether a row of the settings table holds one text rather than a list of texts.
+bool IsSingleText(const ZEPAppSetting& iSetting) {
+  for (const ZEPAppPage& p : AppPages())
+    if (p.table == iSetting.page)
+      if (auto kind = p.stored.find(iSetting.attribute); kind != p.stored.end()) return kind->second == ZEPAppStored::Text;
+  return false;
+}
+
+// A value as JSON: numbers in an array, one text as a string, a list of texts as an array of
+// strings. iSingleText: the value is one text.
+nlohmann::json ValueJson(const ZEPAppValue& iValue, bool iSingleText) {
+  if (const auto* texts = std::get_if<std::vector<std::string>>(&iValue); texts && iSingleText)
+    return texts->empty() ? std::string() : texts->front();
+  return std::visit([](const auto& v) { return nlohmann::json(v); }, iValue);
+}
+
+// The values a repository reads for an attribute, as JSON; null when it has none.
 nlohmann::json StoredJson(const ZEPAppSetting& iSetting) {
   const ZEPSysSettingRepository* repo = ZEPSysSettingRepository::GetRepository(iSetting.repository.c_str());
   const ZEPAppValue* value = repo ? repo->Effective(iSetting.stored) : nullptr;
   if (!value) return nullptr;
-  return std::visit([](const auto& v) { return nlohmann::json(v); }, *value);
+  return ValueJson(*value, IsSingleText(iSetting));
 }
 
-// The stored values as text, shortest forms that read back exactly.
-std::string StoredText(const ZEPAppSetting& iSetting) {
+// A value as text: numbers in the shortest forms that read back exactly, on one line; texts as
+// they are, one a line.
+std::string ValueText(const nlohmann::json& iValue) {
+  if (iValue.is_string()) return iValue.get<std::string>();
   std::string text;
-  for (const auto& v : StoredJson(iSetting)) text += (text.empty() ? "" : " ") + FormatNumber(v.get<double>());
+  for (const auto& v : iValue)
+    text += v.is_string() ? (text.empty() ? "" : "\n") + v.get<std::string>()
+                          : (text.empty() ? "" : " ") + FormatNumber(v.get<double>());
   return text;
 }
 
-// One control as the JSON of show, get and list.
+// The stored values as text.
+std::string StoredText(const ZEPAppSetting& iSetting) { return ValueText(StoredJson(iSetting)); }
+
+// The application's default of a row, as JSON.
+nlohmann::json DefaultJson(const ZEPAppSetting& iSetting) {
+  if (!iSetting.text) return iSetting.defaults;
+  return ValueJson(iSetting.texts, IsSingleText(iSetting));
+}
+
+// Every row of the settings table a control of the page shows, its first row first: the
+// standard combo shows the name, its source flag and the two PLM lists. Empty for a control
+// that stores nothing.
+std::vector<const ZEPAppSetting*> RowsOf(const ZEPAppPage& iPage, const std::string& iControl) {
+  std::vector<const ZEPAppSetting*> rows;
+  const ZEPAppSetting* first = SettingOf(iPage, iControl);
+  if (!first) return rows;
+  for (const ZEPAppSetting& s : AppSettings())
+    if (s.page == first->page && s.control == first->control) rows.push_back(&s);
+  return rows;
+}
+
+// The row a request names: its stored attribute when it gave one, else the control's first.
+const ZEPAppSetting* RowOf(const ZEPAppPage& iPage, const std::string& iControl, const std::string& iAttribute) {
+  for (const ZEPAppSetting* s : RowsOf(iPage, iControl))
+    if (s->stored == iAttribute) return s;
+  return SettingOf(iPage, iControl);
+}
+
+// One control as the JSON of show, get and list; iSetting: which of the control's settings
+// (its first when null).
 nlohmann::json ControlJson(const ZEPAppPage& iPage, const std::vector<ZEPAppControl>& iControls,
-                           const ZEPAppControl& iControl) {
-  const ZEPAppSetting* setting = SettingOf(iPage, iControl.name);
+                           const ZEPAppControl& iControl, const ZEPAppSetting* iSetting = nullptr) {
+  const ZEPAppSetting* setting = iSetting ? iSetting : SettingOf(iPage, iControl.name);
   nlohmann::json j = {{"page", iPage.name},
                       {"control", iControl.name},
                       {"key", iPage.name + "." + iControl.name},
@@ -129,7 +181,7 @@ nlohmann::json ControlJson(const ZEPAppPage& iPage, const std::vector<ZEPAppCont
   if (setting) {
     j["repository"] = setting->repository;
     j["stored"] = StoredJson(*setting);
-    j["default"] = setting->defaults;
+    j["default"] = DefaultJson(*setting);
   }
   return j;
 }
@@ -154,6 +206,9 @@ public:
       _file.OpenSettings(name);
     _file.OpenPreferences("DraftingOptions"); // where dialogs keep their places
     ApplyDefaults();
+    _plmPath = ResolvePLMRepository(iRequest.plm);
+    if (const std::string why = UseStandardsFolder(ResolveStandardsFolder(iRequest.standards)); !why.empty())
+      _err << "warning: " << why << "\n";
     _pRoot = std::make_unique<ZEPDlgWindow>(nullptr, "DraftingOptions", 0);
     for (const ZEPAppFileError& w : _file.LoadWarnings())
       _err << "warning: " << w.Text() << "\n";
@@ -285,7 +340,18 @@ public:
   ZEPAppSettingsFile& File() { return _file; }
   const ZEPAppSettingsPaths& Paths() const { return _paths; }
 
+  // Reads the PLM repository for the chooser, before a control that opens it is operated; a
+  // non-zero exit code after saying why the file cannot be used.
+  int PrepareChooser(const ZEPAppControl& iControl) {
+    if (iControl.name != "pusStandardPLMAdd") return kExitOk;
+    std::string error;
+    if (LoadPLMRepository(_plmPath, error)) return kExitOk;
+    _err << "error: the PLM repository cannot be used: " << error << "\nnothing was changed\n";
+    return kExitFile;
+  }
+
 private:
+  std::string _plmPath;
   std::ostream& _out;
   std::ostream& _err;
   ZEPAppSettingsPaths _paths;
@@ -363,10 +429,11 @@ int Get(const Request& iRequest, std::ostream& out, std::ostream& err) {
   std::vector<ZEPAppControl> controls;
   const ZEPAppControl* control = nullptr;
   if (int rc = session.Target(iRequest, false, page, controls, &control)) return rc;
-  const ZEPAppSetting* setting = SettingOf(*page, control->name);
+  const ZEPAppSetting* setting = RowOf(*page, control->name, iRequest.attribute);
+  const bool ownRow = setting && setting == SettingOf(*page, control->name);
   if (iRequest.json)
-    out << ControlJson(*page, controls, *control).dump(2) << "\n";
-  else if (iRequest.raw && setting)
+    out << ControlJson(*page, controls, *control, setting).dump(2) << "\n";
+  else if ((iRequest.raw || !ownRow) && setting) // a further setting of the control: what it holds
     out << StoredText(*setting) << "\n";
   else if (iRequest.raw)
     out << control->Shown() << "\n"; // a control without setting stores nothing
@@ -383,18 +450,20 @@ int List(const Request& iRequest, std::ostream& out, std::ostream& err) {
   for (const ZEPAppPage& page : AppPages()) {
     std::vector<ZEPAppControl> controls;
     if (int rc = session.Controls(page, 0, controls)) return rc;
-    for (const ZEPAppControl& c : controls) {
-      const ZEPAppSetting* setting = SettingOf(page, c.name);
-      if (!setting || setting->page != page.table) continue; // an embedded page's: listed on its own page
-      if (iRequest.json) {
-        all.push_back(ControlJson(page, controls, c));
-        continue;
+    for (const ZEPAppControl& c : controls)
+      for (const ZEPAppSetting* setting : RowsOf(page, c.name)) {
+        if (setting->page != page.table) break; // an embedded page's: listed on its own page
+        if (iRequest.json) {
+          all.push_back(ControlJson(page, controls, c, setting));
+          continue;
+        }
+        // A further setting of the control: what it holds, as JSON.
+        out << page.name << "." << c.name << "  " << setting->stored << "  "
+            << (setting == SettingOf(page, c.name) ? c.Shown() : StoredJson(*setting).dump());
+        if (c.Locked()) out << "  (locked: " << c.LockText() << ")";
+        else if (c.Disabled()) out << "  (disabled)";
+        out << "\n";
       }
-      out << page.name << "." << c.name << "  " << setting->stored << "  " << c.Shown();
-      if (c.Locked()) out << "  (locked: " << c.LockText() << ")";
-      else if (c.Disabled()) out << "  (disabled)";
-      out << "\n";
-    }
   }
   if (iRequest.json) out << all.dump(2) << "\n";
   return kExitOk;
@@ -406,6 +475,7 @@ int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
   std::vector<ZEPAppControl> controls;
   const ZEPAppControl* control = nullptr;
   if (int rc = session.Target(iRequest, true, page, controls, &control)) return rc;
+  if (int rc = session.PrepareChooser(*control)) return rc;
   const ZEPAppOutcome outcome = OperateControl(controls, *control, iRequest.value);
   const int range = ShownRange(controls);
   CloseSubDialog(*control); // as the user closes the dialog the change was made in
@@ -413,6 +483,7 @@ int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
     err << "error: " << outcome.message << "\nnothing was changed\n";
     return outcome.code;
   }
+  if (!outcome.warning.empty()) err << "warning: " << outcome.warning << "\n";
   if (outcome.changed && FAILED(session.File().SaveAll())) {
     err << "error: the change was not saved: " << session.File().LastError() << "\n";
     return kExitFile;
@@ -421,7 +492,7 @@ int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
   const ZEPAppSetting* setting = SettingOf(*page, control->name);
   if (setting && setting->defaults.size() > 1 && range)
     out << "  (scale range " << range << ": " << ScaleName(range) << ")";
-  if (!setting && !control->opensNewerDialog)
+  if (!setting && !control->opensNewerDialog && control->Kind() != ZEPAppKind::Push)
     out << "  (only for this run: it stores nothing; --range N chooses a range)";
   out << "\n";
   return kExitOk;
@@ -462,21 +533,24 @@ int Reset(const Request& iRequest, std::ostream& out, std::ostream& err) {
         << ") keeps no setting of its own\n";
     return kExitUsage;
   }
-  ZEPSysSettingRepository* repo =
-      ZEPSysSettingRepository::GetRepository(setting->repository.c_str());
-  ZEPSettingInfo info;
-  if (repo && repo->IsLocked(setting->stored) &&
-      SUCCEEDED(repo->GetLockInfo(setting->stored, info))) {
-    err << "error: " << Quoted(control->Title()) << " is locked: "
-        << (info.GetLockText().empty() ? "Locked by an administrator" : info.GetLockText())
-        << "\nnothing was changed\n";
-    return kExitRefused;
+  // Every setting the control shows goes back together.
+  const std::vector<const ZEPAppSetting*> rows = RowsOf(*page, control->name);
+  for (const ZEPAppSetting* row : rows) {
+    ZEPSysSettingRepository* repo = ZEPSysSettingRepository::GetRepository(row->repository.c_str());
+    ZEPSettingInfo info;
+    if (repo && repo->IsLocked(row->stored) && SUCCEEDED(repo->GetLockInfo(row->stored, info))) {
+      err << "error: " << Quoted(control->Title()) << " is locked: "
+          << (info.GetLockText().empty() ? "Locked by an administrator" : info.GetLockText())
+          << "\nnothing was changed\n";
+      return kExitRefused;
+    }
   }
   const std::string name = control->name, title = control->Title();
-  if (FAILED(session.File().Reset(setting->repository, setting->stored))) {
-    err << "error: " << session.File().LastError() << "\n";
-    return kExitFile;
-  }
+  for (const ZEPAppSetting* row : rows)
+    if (FAILED(session.File().Reset(row->repository, row->stored))) {
+      err << "error: " << session.File().LastError() << "\n";
+      return kExitFile;
+    }
   controls = PageControls(session.Open(*page, true), page->dialogButtons); // shows the default now
   const ZEPAppControl* shown = FindPageControl(controls, name);
   out << title << ": " << (shown ? shown->Shown() : "") << " (default";
@@ -505,41 +579,59 @@ int Administer(const Request& iRequest, AdminAction iAction, std::ostream& out, 
     err << "error: " << Quoted(control->Title()) << " (" << control->name << ") keeps no setting of its own\n";
     return kExitUsage;
   }
-  ZEPSysSettingRepository* repo = ZEPSysSettingRepository::GetRepository(setting->repository.c_str());
-  std::optional<ZEPAppValue> value;
-  if (iRequest.hasValue && repo) {
-    if (repo->IsLocked(setting->stored)) { // a new value for a lock: the control must take it first
-      repo->SetLock(setting->stored, false);
+  // Every setting the control shows is administered together (the standard's name with its
+  // source flag and the PLM lists): a lock on part of them would leave the rest to disagree.
+  const std::vector<const ZEPAppSetting*> rows = RowsOf(*page, control->name);
+  std::vector<std::optional<ZEPAppValue>> values(rows.size());
+  if (iRequest.hasValue) {
+    bool wasLocked = false; // a new value for a lock: the control must take it first
+    for (const ZEPAppSetting* row : rows)
+      if (ZEPSysSettingRepository* repo = ZEPSysSettingRepository::GetRepository(row->repository.c_str()))
+        if (repo->IsLocked(row->stored)) {
+          repo->SetLock(row->stored, false);
+          wasLocked = true;
+        }
+    if (wasLocked) {
       const std::string name = control->name;
       session.Open(*page, true);
       if (int rc = session.Controls(*page, iRequest.range, controls)) return rc;
       control = FindPageControl(controls, name);
       if (!control) return kExitFailure;
     }
+    if (int rc = session.PrepareChooser(*control)) return rc;
     const ZEPAppOutcome outcome = OperateControl(controls, *control, iRequest.value);
     CloseSubDialog(*control);
     if (outcome.code != kExitOk) {
       err << "error: " << outcome.message << "\nnothing was changed\n";
       return outcome.code;
     }
-    if (const ZEPAppValue* now = repo->Effective(setting->stored)) value = *now;
+    if (!outcome.warning.empty()) err << "warning: " << outcome.warning << "\n";
+    for (std::size_t i = 0; i < rows.size(); ++i)
+      if (const ZEPSysSettingRepository* repo = ZEPSysSettingRepository::GetRepository(rows[i]->repository.c_str()))
+        if (const ZEPAppValue* now = repo->Effective(rows[i]->stored)) values[i] = *now;
   }
-  const std::string& repository = setting->repository;
   const std::string& attribute = setting->stored;
-  long rc = S_OK;
-  switch (iAction) {
-  case AdminAction::Lock:
-    rc = value ? session.File().Lock(repository, attribute, *value) : session.File().Lock(repository, attribute);
-    break;
-  case AdminAction::Unlock:
-    rc = session.File().Unlock(repository, attribute);
-    break;
-  case AdminAction::Default:
-    rc = value ? session.File().SetAdminDefault(repository, attribute, *value) : E_FAIL;
-    break;
-  case AdminAction::RemoveDefault:
-    rc = session.File().RemoveAdminDefault(repository, attribute);
-    break;
+  long rc = 1; // 1: nothing to do for any of the rows
+  for (std::size_t i = 0; i < rows.size() && SUCCEEDED(rc); ++i) {
+    const std::string& repository = rows[i]->repository;
+    const std::string& stored = rows[i]->stored;
+    const std::optional<ZEPAppValue>& value = values[i];
+    long one = S_OK;
+    switch (iAction) {
+    case AdminAction::Lock:
+      one = value ? session.File().Lock(repository, stored, *value) : session.File().Lock(repository, stored);
+      break;
+    case AdminAction::Unlock:
+      one = session.File().Unlock(repository, stored);
+      break;
+    case AdminAction::Default:
+      one = value ? session.File().SetAdminDefault(repository, stored, *value) : E_FAIL;
+      break;
+    case AdminAction::RemoveDefault:
+      one = session.File().RemoveAdminDefault(repository, stored);
+      break;
+    }
+    rc = FAILED(one) ? one : (one == 1 && rc == 1 ? 1 : S_OK);
   }
   if (FAILED(rc)) {
     err << "error: " << session.File().LastError() << "\n";
@@ -577,7 +669,10 @@ int Locks(const Request& iRequest, std::ostream& out, std::ostream& err) {
         if (s.repository == repository && s.stored == attribute)
           if (const ZEPAppPage* p = PageOf(s)) key = p->name + "." + s.control;
       nlohmann::json value = nullptr;
-      if (entry.value) value = std::visit([](const auto& v) { return nlohmann::json(v); }, *entry.value);
+      bool singleText = false;
+      for (const ZEPAppSetting& s : AppSettings())
+        if (s.repository == repository && s.stored == attribute) singleText = IsSingleText(s);
+      if (entry.value) value = ValueJson(*entry.value, singleText);
       all.push_back({{"repository", repository},
                      {"attribute", attribute},
                      {"key", key.empty() ? nlohmann::json(nullptr) : nlohmann::json(key)},
@@ -592,8 +687,9 @@ int Locks(const Request& iRequest, std::ostream& out, std::ostream& err) {
   out << "Administrator's file: " << (session.Paths().admin.empty() ? "none" : session.Paths().admin) << "\n";
   if (all.empty()) out << "  no lock and no default\n";
   for (const auto& e : all) {
-    std::string values;
-    for (const auto& v : e["value"]) values += (values.empty() ? "" : " ") + FormatNumber(v.get<double>());
+    std::string values = e["value"].is_null() ? std::string() : ValueText(e["value"]);
+    for (char& c : values)
+      if (c == '\n') c = ','; // a list of texts on the line
     out << "  " << e["attribute"].get<std::string>() << "  "
         << (e["key"].is_null() ? std::string("(no control)") : e["key"].get<std::string>()) << "  " << values << "  "
         << (e["locked"].get<bool>() ? "locked by " + e["by"].get<std::string>() : std::string("default")) << "\n";
@@ -708,6 +804,12 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
                  "The administrator's settings file: defaults and locks (default: $" +
                      std::string(kAdminFileEnv) + ", else drafting-options/admin.json in $XDG_CONFIG_DIRS, "
                      "/etc/xdg by default)");
+  app.add_option("--standards", r.standards,
+                 "The standards folder: its drafting/ folder holds the folder standards (default: $" +
+                     std::string(kStandardsFolderEnv) + ", else the sample standards of the resources)");
+  app.add_option("--plm-repository", r.plm,
+                 "The PLM repository file whose standards the PLM chooser lists (default: $" +
+                     std::string(kPLMRepositoryEnv) + ", else the sample plm/standards.json of the resources)");
   auto rangeOption = [&r](CLI::App* cmd) {
     cmd->add_option("--range", r.range, "Grid page: the scale range to work on, 1 to 5")
         ->check(CLI::Range(1, 5));
@@ -788,7 +890,7 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
     for (const CLI::App* sub : app.get_subcommands([](CLI::App*) { return true; })) commands.push_back(sub->get_name());
     for (int i = 1; i < argc; ++i) {
       const std::string word = argv[i];
-      if (word == "--settings" || word == "--admin") {
+      if (word == "--settings" || word == "--admin" || word == "--standards" || word == "--plm-repository") {
         ++i;
         continue;
       }

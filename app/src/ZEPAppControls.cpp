@@ -1,5 +1,6 @@
 #include "ZEPAppControls.h"
 
+#include "ZEPAppBinding.h"
 #include "ZEP2DBaseRangeCmb.h"
 #include "ZEPDrwLockDialog.h"
 #include "ZEPDrwLockFrame.h"
@@ -10,6 +11,7 @@
 #include <cmath>
 #include <cstdio>
 #include <cstdlib>
+#include <filesystem>
 
 namespace zepapp {
 
@@ -246,12 +248,96 @@ std::vector<std::string> Choices(const ZEPAppControl& iControl) {
   return texts;
 }
 
+// ---- the main page's standards and scale ratio ---------------------------------------------------
+// The controls that need more than a line, a number or a text: the standard combo (its PLM lines
+// carry keys), the PLM chooser's buttons, the scale ratio editor and the folder editors.
+const char* const kStandardCombo = "cmbStandardName";
+const char* const kAddPLMStandard = "pusStandardPLMAdd";
+const char* const kRemovePLMStandard = "pusStandardPLMRemove";
+const char* const kRatioEditor = "edtScaleRatio";
+const char* const kFolderEditors[] = {"FrameAndTitleBlockPath"};
+const char* const kDatabaseIcon = "I_D3M_Database";
+
+// The texts a repository reads for a row of the main page's table; empty when none.
+std::vector<std::string> StoredTexts(const char* iAttribute) {
+  std::vector<std::string> texts;
+  if (const ZEPAppSetting* s = FindSetting("Main", iAttribute))
+    if (const ZEPSysSettingRepository* rep = ZEPSysSettingRepository::GetRepository(s->repository.c_str()))
+      rep->ReadAttr(s->stored.c_str(), texts);
+  return texts;
+}
+
+struct StandardLine {
+  std::string text;
+  std::string key; // a PLM line's unique key; empty for a folder standard
+};
+
+// The standard combo's lines, each PLM line with its key. The PLM lines are the combo's last
+// lines, in the order of the stored lists.
+std::vector<StandardLine> StandardLines(const ZEPDlgCombo& iCombo) {
+  const std::vector<std::string> keys = StoredTexts("StandardPLMIDList");
+  std::vector<StandardLine> lines;
+  for (int i = 0; i < iCombo.GetLineCount(); ++i) {
+    ZEPUnicodeString text;
+    iCombo.GetLine(text, i);
+    lines.push_back({text.str(), ""});
+  }
+  const int firstPLM = iCombo.GetLineCount() - static_cast<int>(keys.size());
+  for (int i = std::max(firstPLM, 0); i < iCombo.GetLineCount(); ++i) {
+    ZEPString icon;
+    iCombo.GetLineIconName(icon, i);
+    if (icon != kDatabaseIcon) return lines; // the lists and the combo disagree: no keys
+  }
+  for (int i = std::max(firstPLM, 0); i < iCombo.GetLineCount(); ++i)
+    lines[static_cast<std::size_t>(i)].key = keys[static_cast<std::size_t>(i - firstPLM)];
+  return lines;
+}
+
+// The tolerance bounds of the scale ratio at a range (1 to 5); false when the host's
+// tolerances give none.
+bool RatioBounds(int iRange, double& oLow, double& oHigh) {
+  const ZEPDibTolerances tolerances(ZEP2DBaseRangeCmb::GetMatchingRange(iRange >= 1 && iRange <= 5 ? iRange : 1));
+  const double largest = tolerances.GetTolerance(7), smallest = tolerances.GetTolerance(6);
+  if (!std::isfinite(largest) || !std::isfinite(smallest) || largest <= 0.0 || smallest <= 0.0) return false;
+  oLow = 1.0 / largest;
+  oHigh = 1.0 / smallest;
+  return true;
+}
+
+// The range the scale range combo beside the ratio editor shows; 1 when there is none.
+int RangeBeside(const ZEPDialog* iEditor) {
+  const ZEPDialog* parent = iEditor ? iEditor->GetParentDialog() : nullptr;
+  if (parent)
+    for (const ZEPDialog* child : parent->GetChildren())
+      if (const auto* range = dynamic_cast<const ZEP2DBaseRangeCmb*>(child)) {
+        const int r = range->GetSelect();
+        if (r >= 1 && r <= 5) return r;
+      }
+  return 1;
+}
+
+std::string Number(double iValue) {
+  char text[32];
+  std::snprintf(text, sizeof text, "%g", iValue);
+  return text;
+}
+
 void Walk(ZEPDialog* iWidget, std::string iSection, std::vector<ZEPAppControl>& oControls) {
   if (ZEPSysDynamicCast<ZEPDlgWindow>(iWidget)) return; // a sub-dialog: listed after the page
   if (auto* section = ZEPSysDynamicCast<ZEPDlgToolsOptionsFrame>(iWidget))
     iSection = section->GetTitle().str();
   if (auto* lockAware = dynamic_cast<ZEPDrwLockDialog*>(iWidget)) {
     ZEPDialog* inner = lockAware->GetDialog();
+    // A padlocked frame without radio buttons only puts its controls under one padlock (the
+    // main page's scale ratio): they are the controls, each with that padlock.
+    if (inner && dynamic_cast<ZEPDrwLockFrame*>(iWidget) && Radios(inner).empty()) {
+      const std::size_t first = oControls.size();
+      for (ZEPDialog* child : inner->GetChildren())
+        Walk(child, iSection, oControls);
+      for (std::size_t i = first; i < oControls.size(); ++i)
+        if (!oControls[i].lockAware) oControls[i].lockAware = lockAware;
+      return;
+    }
     if (inner) oControls.push_back({iWidget->GetOwnName(), iWidget, inner, lockAware, iSection});
     // A padlocked group may hold controls of their own beside its radio buttons.
     if (inner && dynamic_cast<ZEPDrwLockFrame*>(iWidget))
@@ -262,7 +348,8 @@ void Walk(ZEPDialog* iWidget, std::string iSection, std::vector<ZEPAppControl>& 
   if (dynamic_cast<ZEPDrwLockLabel*>(iWidget)) return; // a caption
   const bool operable = PickableCombo(iWidget) || ZEPSysDynamicCast<ZEPDlgSpinner>(iWidget) ||
                         ZEPSysDynamicCast<ZEPDlgCheckButton>(iWidget) ||
-                        ZEPSysDynamicCast<ZEPDlgPushButton>(iWidget);
+                        ZEPSysDynamicCast<ZEPDlgPushButton>(iWidget) ||
+                        ZEPSysDynamicCast<ZEPDlgEditor>(iWidget);
   if (operable) {
     if (iWidget->GetVisibility() != ZEPDlgHide)
       oControls.push_back({iWidget->GetOwnName(), iWidget, iWidget, nullptr, iSection});
@@ -280,6 +367,7 @@ ZEPAppKind ZEPAppControl::Kind() const {
   if (ZEPSysDynamicCast<ZEPDlgSpinner>(inner)) return ZEPAppKind::Spinner;
   if (PickableCombo(inner)) return ZEPAppKind::Combo;
   if (ZEPSysDynamicCast<ZEPDlgPushButton>(inner)) return ZEPAppKind::Push;
+  if (ZEPSysDynamicCast<ZEPDlgEditor>(inner)) return ZEPAppKind::Editor;
   if (!Radios(inner).empty()) return ZEPAppKind::Choice;
   return ZEPAppKind::Other;
 }
@@ -307,6 +395,8 @@ std::string ZEPAppControl::Shown() const {
     for (ZEPDlgRadioButton* radio : Radios(inner))
       if (radio->GetState() == ZEPDlgChecked) return TitleOf(*radio);
     return "(none)";
+  case ZEPAppKind::Editor:
+    return ZEPSysDynamicCast<ZEPDlgEditor>(inner)->GetText().str();
   case ZEPAppKind::Push:
   case ZEPAppKind::Other:
     break;
@@ -357,12 +447,35 @@ std::string ZEPAppControl::Accepts() const {
     }
     const char* what = Kind() == ZEPAppKind::Combo ? "line" : "choice";
     std::string text = std::string("a ") + what + " number from 1 to " +
-                       std::to_string(lines.size()) + " or the text of a " + what + ":";
-    for (std::size_t i = 0; i < lines.size(); ++i)
+                       std::to_string(lines.size()) + " or the text of a " + what;
+    if (name == kStandardCombo) text += ", or a PLM standard's key";
+    text += ":";
+    const std::vector<StandardLine> standards =
+        name == kStandardCombo ? StandardLines(*PickableCombo(inner)) : std::vector<StandardLine>();
+    for (std::size_t i = 0; i < lines.size(); ++i) {
       text += "\n  " + std::to_string(i + 1) + "  " + lines[i];
+      if (i < standards.size() && !standards[i].key.empty()) text += "  (PLM standard, key " + standards[i].key + ")";
+    }
     return text;
   }
+  case ZEPAppKind::Editor:
+    if (name == kRatioEditor) {
+      double low = 0, high = 0;
+      return "a scale ratio as 1:50, 1/50 or a number" +
+             (RatioBounds(RangeBeside(inner), low, high) ? " from " + Number(low) + " to " + Number(high) + " at this scale range"
+                                            : std::string()) +
+             " (--range N for another range)";
+    }
+    return "a text in UTF-8, not empty, without control characters";
   case ZEPAppKind::Push:
+    if (name == kAddPLMStandard) {
+      std::string text = "the display name or the unique key of a standard of the PLM repository:";
+      for (const ZEPPLMSetup::Standard& s : ZEPPLMSetup::Repository())
+        text += "\n  " + s.name + "  (key " + s.key + ")";
+      if (ZEPPLMSetup::Repository().empty()) text += " it lists none";
+      return text;
+    }
+    if (name == kRemovePLMStandard) return "the display name or the unique key of a listed PLM standard";
     if (opensNewerDialog)
       return "open, accept, cancel or reject: what to do with the dialog it opens";
     return "nothing: it is a button that opens a dialog; set the controls listed under that dialog";
@@ -688,10 +801,191 @@ ZEPAppOutcome OperateNewerDialog(const ZEPAppControl& iControl, const std::strin
   return out;
 }
 
+// The standard combo: a line by its number, its text or, for a PLM standard, its key; picked
+// from the open list as the user does (the page rebuilds the lines as it opens and closes).
+ZEPAppOutcome ChooseStandard(const ZEPAppControl& iControl, const std::string& iText) {
+  const ZEPDlgCombo* combo = PickableCombo(iControl.inner);
+  if (!ZEPDlgDriver::DropDown(iControl.inner)) return Refused(iControl);
+  const std::vector<StandardLine> lines = StandardLines(*combo);
+  int line = -1;
+  std::vector<std::string> texts;
+  for (std::size_t i = 0; i < lines.size(); ++i) {
+    texts.push_back(lines[i].text);
+    if (!lines[i].key.empty() && lines[i].key == Trim(iText)) line = static_cast<int>(i);
+  }
+  if (line < 0) line = FindLine(texts, iText);
+  const int selected = combo->GetSelect();
+  const bool picked = line >= 0 && line != selected && ZEPDlgDriver::Select(iControl.inner, line);
+  ZEPDlgDriver::CloseUp(iControl.inner);
+  if (line < 0) {
+    const auto same = std::count(texts.begin(), texts.end(), Trim(iText));
+    return BadValue(iControl, Quoted(iText) + (same > 1 ? " is the name of " + std::to_string(same) +
+                                                              " PLM standards: give the key of the one meant"
+                                                        : " is not one of its lines"));
+  }
+  if (line == selected) return Done(iControl, false);
+  if (!picked) return Refused(iControl);
+  return Done(iControl, true);
+}
+
+// The add button: the standard of the PLM repository named by its key or display name is
+// chosen in the PLM object chooser that the button opens, and the chooser validated.
+ZEPAppOutcome AddPLMStandard(const ZEPAppControl& iControl, const std::string& iText) {
+  const std::string wanted = Trim(iText);
+  const std::vector<ZEPPLMSetup::Standard>& repository = ZEPPLMSetup::Repository();
+  std::vector<const ZEPPLMSetup::Standard*> found;
+  for (const ZEPPLMSetup::Standard& s : repository)
+    if (s.key == wanted) found = {&s};
+  for (int pass = 0; pass < 2 && found.empty(); ++pass) // the name as typed, then ignoring case
+    for (const ZEPPLMSetup::Standard& s : repository)
+      if (pass == 0 ? s.name == wanted : Lower(s.name) == Lower(wanted)) found.push_back(&s);
+  if (found.empty()) return BadValue(iControl, Quoted(iText) + " is not in the PLM repository");
+  if (found.size() > 1) {
+    std::string keys;
+    for (const ZEPPLMSetup::Standard* s : found) keys += (keys.empty() ? "" : ", ") + s->key;
+    return BadValue(iControl, Quoted(iText) + " is the name of " + std::to_string(found.size()) +
+                                  " standards of the PLM repository (keys " + keys + "): give the key of the one meant");
+  }
+  const ZEPPLMSetup::Standard chosen = *found.front();
+  if (chosen.unicity < 0)
+    return BadValue(iControl, "the PLM repository does not guarantee the key " + chosen.key + " of " +
+                                  Quoted(chosen.name) + " to be unique, so the page does not take it");
+  const std::vector<std::string> keys = StoredTexts("StandardPLMIDList");
+  if (std::find(keys.begin(), keys.end(), chosen.key) != keys.end()) {
+    ZEPAppOutcome out;
+    out.message = Quoted(chosen.name) + " (key " + chosen.key + ") is listed already (unchanged)";
+    return out;
+  }
+  ZEPCheckLog::Clear();
+  if (!ZEPDlgDriver::Click(iControl.inner)) return Refused(iControl);
+  ZEPIPLMChooser* chooser = ZEPPLMSetup::LiveChooser();
+  if (!chooser || chooser->GetVisibility() != ZEPDlgShow) {
+    std::string why = "the PLM object chooser could not be opened";
+    if (ZEPCheckLog::Count()) why += " (" + ZEPCheckLog::Entries().back().expression + ")";
+    return Fail(kExitFailure, why);
+  }
+  // The user picks the object the chooser lists, as the repository gives it.
+  const std::vector<ZEPPLMSetup::Standard> listed = ZEPPLMSetup::Listed(chooser);
+  const auto it = std::find_if(listed.begin(), listed.end(),
+                               [&](const ZEPPLMSetup::Standard& s) { return s.key == chosen.key; });
+  if (it == listed.end()) {
+    ZEPPLMSetup::Cancel();
+    return Fail(kExitFailure, "the PLM object chooser does not offer " + Quoted(chosen.name));
+  }
+  if (!ZEPPLMSetup::Validate({*it})) return Fail(kExitFailure, "the PLM object chooser could not be validated");
+  if (ZEPCheckLog::Count())
+    return Fail(kExitFailure, "the page did not take " + Quoted(chosen.name) + " (" +
+                                  ZEPCheckLog::Entries().back().expression + ")");
+  ZEPAppOutcome out;
+  out.changed = true;
+  out.message = "Added " + Quoted(chosen.name) + " (key " + chosen.key + ") from the PLM repository; it is the "
+                "current standard";
+  return out;
+}
+
+// The remove button removes the current PLM standard: the one named is made current first,
+// and the standard that was current before is chosen again when it is still listed.
+ZEPAppOutcome RemovePLMStandard(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl,
+                                const std::string& iText) {
+  const ZEPAppControl* combo = ByName(iControls, kStandardCombo);
+  if (!combo) return Fail(kExitFailure, "the page has no standard combo");
+  const std::string why = WhyRefused(iControls, *combo);
+  if (!why.empty()) return Fail(kExitRefused, why);
+  const std::vector<StandardLine> lines = StandardLines(*PickableCombo(combo->inner));
+  std::vector<std::string> names, keys;
+  for (const StandardLine& l : lines)
+    if (!l.key.empty()) {
+      names.push_back(l.text);
+      keys.push_back(l.key);
+    }
+  auto at = std::find(keys.begin(), keys.end(), Trim(iText));
+  if (at == keys.end()) {
+    const int line = FindLine(names, iText);
+    at = line < 0 ? keys.end() : keys.begin() + line;
+  }
+  if (at == keys.end()) {
+    std::string listed;
+    for (std::size_t i = 0; i < names.size(); ++i) listed += "\n  " + names[i] + "  (key " + keys[i] + ")";
+    return Fail(kExitBadValue, Quoted(iText) + " is not a listed PLM standard (give its name or its key); " +
+                                   Quoted(iControl.Title()) + " (" + iControl.name + ") takes " +
+                                   (names.empty() ? std::string("nothing now: no PLM standard is listed") :
+                                                    "one of:" + listed));
+  }
+  const std::string key = *at, name = names[static_cast<std::size_t>(at - keys.begin())];
+  // What was current, to choose it again: a PLM standard by its key, a folder one by its text.
+  const int before = PickableCombo(combo->inner)->GetSelect();
+  const std::string previous = before >= 0 && static_cast<std::size_t>(before) < lines.size()
+                                   ? (lines[static_cast<std::size_t>(before)].key.empty()
+                                          ? lines[static_cast<std::size_t>(before)].text
+                                          : lines[static_cast<std::size_t>(before)].key)
+                                   : "";
+  const ZEPAppOutcome current = ChooseStandard(*combo, key);
+  if (current.code != kExitOk) return current;
+  const std::string notNow = WhyRefused(iControls, iControl);
+  if (!notNow.empty()) return Fail(kExitRefused, notNow);
+  if (!ZEPDlgDriver::Click(iControl.inner)) return Refused(iControl);
+  if (!previous.empty() && previous != key) ChooseStandard(*combo, previous);
+  ZEPAppOutcome out;
+  out.changed = true;
+  out.message = "Removed " + Quoted(name) + " (key " + key + "); " + combo->Title() + ": " + combo->Shown();
+  return out;
+}
+
+// The scale ratio of the range shown: parsed and bounded as the page does it, so that a
+// refusal says why; then typed in.
+ZEPAppOutcome EnterRatio(const ZEPAppControl& iControl, const std::string& iText) {
+  ZEPUnicodeString normal, shownNormal;
+  double value = 1.0, shown = 1.0;
+  int form = 0;
+  if (FAILED(ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(iText, normal, value, form)))
+    return BadValue(iControl, Quoted(iText) + " is not a scale ratio");
+  const int range = RangeBeside(iControl.inner);
+  double low = 0, high = 0;
+  if (!RatioBounds(range, low, high))
+    return Fail(kExitBadValue, "no scale ratio is accepted at this scale range: the host gives it no tolerances");
+  if (value < low || value > high) return BadValue(iControl, Number(value) + " is outside the limits");
+  auto* editor = ZEPSysDynamicCast<ZEPDlgEditor>(iControl.inner);
+  const bool same = SUCCEEDED(ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(
+                        editor->GetText(), shownNormal, shown, form)) &&
+                    std::fabs(shown - value) <= 1e-9 * value;
+  if (same) return Done(iControl, false);
+  if (!ZEPDlgDriver::EnterText(iControl.inner, iText)) return Refused(iControl);
+  // The page shows the stored ratio again: what it shows now is what it took.
+  if (FAILED(ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(editor->GetText(), shownNormal, shown,
+                                                                         form)) ||
+      std::fabs(shown - value) > 1e-6 * value)
+    return Fail(kExitBadValue, Quoted(iControl.Title()) + " did not take " + Quoted(iText));
+  return Done(iControl, true);
+}
+
+// A text editor: UTF-8 text, not empty, without control characters. A folder that this
+// computer does not have is taken with a warning: it may exist where drawings are made.
+ZEPAppOutcome EnterText(const ZEPAppControl& iControl, const std::string& iText) {
+  if (iControl.name == kRatioEditor) return EnterRatio(iControl, iText);
+  if (ZEPFirstBadUtf8(iText) != std::string::npos) return BadValue(iControl, "the text is not valid UTF-8");
+  if (Trim(iText).empty()) return BadValue(iControl, "an empty text");
+  if (std::any_of(iText.begin(), iText.end(), [](char c) {
+        return static_cast<unsigned char>(c) < 0x20 || c == 0x7F;
+      }))
+    return BadValue(iControl, "the text holds a control character (a line break, a tab)");
+  const auto* editor = ZEPSysDynamicCast<ZEPDlgEditor>(iControl.inner);
+  if (editor->GetText().str() == iText) return Done(iControl, false);
+  if (!ZEPDlgDriver::EnterText(iControl.inner, iText)) return Refused(iControl);
+  ZEPAppOutcome out = Done(iControl, true);
+  std::error_code ec;
+  for (const char* name : kFolderEditors)
+    if (iControl.name == name && !std::filesystem::is_directory(iText, ec))
+      out.warning = "there is no folder " + Quoted(iText) + " on this computer; it is kept as typed";
+  return out;
+}
+
 } // namespace
 
 ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls,
                              const ZEPAppControl& iControl, const std::string& iText) {
+  // The remove button waits for a PLM standard to be current: choosing it is part of removing.
+  if (iControl.name == kRemovePLMStandard && !iControl.Locked())
+    return RemovePLMStandard(iControls, iControl, iText);
   const std::string why = WhyRefused(iControls, iControl);
   if (!why.empty()) return Fail(kExitRefused, why);
   switch (iControl.Kind()) {
@@ -742,6 +1036,7 @@ ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls,
         return Refused(iControl);
       return Done(iControl, true);
     }
+    if (iControl.name == kStandardCombo) return ChooseStandard(iControl, iText);
     const int line = FindLine(Lines(*combo), iText);
     if (line < 0) return BadValue(iControl, Quoted(iText) + " is not one of its lines");
     if (line == combo->GetSelect()) return Done(iControl, false);
@@ -761,7 +1056,11 @@ ZEPAppOutcome OperateControl(const std::vector<ZEPAppControl>& iControls,
   }
   case ZEPAppKind::Push:
     if (iControl.opensNewerDialog) return OperateNewerDialog(iControl, iText);
+    if (iControl.name == kAddPLMStandard) return AddPLMStandard(iControl, iText);
+    if (iControl.name == kRemovePLMStandard) return RemovePLMStandard(iControls, iControl, iText);
     break;
+  case ZEPAppKind::Editor:
+    return EnterText(iControl, iText);
   case ZEPAppKind::Other:
     break;
   }

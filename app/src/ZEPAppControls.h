@@ -22,8 +22,8 @@ enum ZEPAppExit : int {
 };
 
 // Choice: radio buttons of one group, chosen by their text. Push: a button that opens a
-// sub-dialog; it has no value of its own.
-enum class ZEPAppKind { Check, Spinner, Combo, Choice, Push, Other };
+// sub-dialog or a chooser; it has no value of its own. Editor: a text typed in.
+enum class ZEPAppKind { Check, Spinner, Combo, Choice, Push, Editor, Other };
 
 // One control of a page: a lock-aware control, or an operable control without padlock
 // (the grid page's scale range combo, a push button), on the page or in a sub-dialog.
@@ -72,6 +72,7 @@ struct ZEPAppOutcome {
   int code = kExitOk;
   std::string message;  // what happened, or why not
   bool changed = false; // the user action was performed
+  std::string warning;  // done, but worth a word (a folder that is not on this computer)
 };
 
 // Operates the control with iText as a user would (click, enter, select), or refuses.

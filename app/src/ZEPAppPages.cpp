@@ -7,11 +7,13 @@
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
+#include "ZEP2DBaseOptMainFrm.h"
 #include "ZEP2DBaseOptManipFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
 #include <algorithm>
 #include <set>
+#include <variant>
 
 namespace zepapp {
 namespace {
@@ -70,6 +72,42 @@ protected:
 
 private:
   ZEPAppBinding _binding{"Geometry"};
+};
+
+// The main page: the folder standards are those of the standards container (the application
+// points it at its standards folder), the PLM standards those the chooser lists.
+class MainPage : public ZEP2DBaseOptMainFrm {
+public:
+  explicit MainPage(ZEPDialog* iParent) : ZEP2DBaseOptMainFrm(iParent, "MainPage") {}
+
+protected:
+#define ZEP_SETTING(Name, Kind) ZEP_APP_BIND_SETTING_HOOKS(Name, Kind)
+#include "ZEP2DBaseOptMainFrm.def"
+#undef ZEP_SETTING
+  ZEPString GetFrameIconName() override { return "I_DraftingStandard"; }
+  // The default of the standard name: the administrator's when given, else the application's.
+  ZEPUnicodeString GetDefaultStandardName() override {
+    const ZEPAppSetting* setting = FindSetting("Main", "StandardName");
+    if (!setting) return ZEPUnicodeString();
+    const ZEPSysSettingRepository* rep = ZEPSysSettingRepository::GetRepository(setting->repository.c_str());
+    auto it = rep ? rep->Defaults().find(setting->stored) : std::map<std::string, ZEPSysSettingRepository::Value>::const_iterator();
+    if (rep && it != rep->Defaults().end())
+      if (const auto* texts = std::get_if<std::vector<std::string>>(&it->second); texts && !texts->empty())
+        return ZEPUnicodeString(texts->front());
+    return setting->texts.empty() ? ZEPUnicodeString() : ZEPUnicodeString(setting->texts.front());
+  }
+
+  ZEPAppBinding _binding{"Main"};
+};
+
+// Adding and removing PLM standards changes the PLM lists: the two buttons carry their padlock.
+class MainPageWithPLMButtons : public MainPage {
+public:
+  using MainPage::MainPage;
+
+protected:
+  long GetSysStandardPLMAddInfo(ZEPSettingInfo& oInfo) override { return GetSysStandardPLMListInfo(oInfo); }
+  long GetSysStandardPLMRemoveInfo(ZEPSettingInfo& oInfo) override { return GetSysStandardPLMListInfo(oInfo); }
 };
 
 // Every section of the dimension page is shown, the oriented dimensions' origin symbol too.
@@ -210,6 +248,9 @@ const std::map<std::string, ZEPAppStored> kGridStored = {
 const std::map<std::string, ZEPAppStored> kGeneralStored = {
 #include "ZEP2DBaseOptGalFrm.def"
 };
+const std::map<std::string, ZEPAppStored> kMainStored = {
+#include "ZEP2DBaseOptMainFrm.def"
+};
 const std::map<std::string, ZEPAppStored> kPrimaryViewStored = {
 #include "ZEP2DBasePrimaryViewFrm.def"
 };
@@ -251,6 +292,9 @@ const std::set<std::string> kGridFlags = {
 const std::set<std::string> kGeneralFlags = {
 #include "ZEP2DBaseOptGalFrm.def"
 };
+const std::set<std::string> kMainFlags = {
+#include "ZEP2DBaseOptMainFrm.def"
+};
 const std::set<std::string> kPrimaryViewFlags = {
 #include "ZEP2DBasePrimaryViewFrm.def"
 };
@@ -285,6 +329,7 @@ const struct {
 const std::vector<ZEPAppPage>& AppPages() {
   static const std::vector<ZEPAppPage> pages = {
       // clang-format off
+      {"main", "Standard and scale", "Main", &Open<MainPageWithPLMButtons>, kMainStored, {}, {}, kMainFlags},
       {"general", "General", "General", &Open<GeneralPage>, kGeneralStored, {}, {}, kGeneralFlags},
       {"dimension", "Dimension", "Dimension", &Open<DimensionPage>, kDimensionStored, {"pushAssoc3D"}, {},
        kDimensionFlags},
@@ -348,6 +393,10 @@ void ApplyDefaults() {
       break;
     case ZEPAppStored::Double:
       rep->SetDefault(s.stored, s.defaults);
+      break;
+    case ZEPAppStored::Text:
+    case ZEPAppStored::TextList:
+      rep->SetDefault(s.stored, s.texts);
       break;
     case ZEPAppStored::Unsupported:
       break;

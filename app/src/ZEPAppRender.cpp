@@ -87,7 +87,7 @@ fieldset.section legend{padding:0 6px;font-weight:600;color:#203656}
 .spinner,.combo,.editor{display:inline-flex;align-items:stretch;border:1px solid #8f98a4;border-radius:3px;background:#fff;min-height:22px}
 .spinner .value{min-width:84px;padding:2px 6px;text-align:right;font-variant-numeric:tabular-nums}
 .spinner .arrows{display:flex;flex-direction:column;border-left:1px solid #c3c9d0;background:#eef0f3;width:15px;font-size:7px;line-height:10px;text-align:center;color:#444}
-.combo .value{min-width:120px;padding:2px 6px}
+.combo .value{min-width:120px;padding:2px 6px;display:inline-flex;align-items:center;gap:5px}
 .combo .drop{border-left:1px solid #c3c9d0;background:#eef0f3;width:18px;text-align:center;font-size:9px;line-height:20px;color:#444}
 .editor .value{min-width:120px;padding:2px 6px}
 .push{display:inline-block;padding:3px 14px;border:1px solid #7a8390;border-radius:3px;background:linear-gradient(#fdfdfd,#e3e6ea)}
@@ -189,14 +189,43 @@ void RenderDialog(const ZEPAppRenderPage& iPage, const ZEPDialog& iDialog, std::
   out += "</div><div class=\"buttons\"><a class=\"push\" href=\"#\">Close</a></div></div></div>\n";
 }
 
+// The icons of combo lines that tell where a line comes from (the main page's standard combo):
+// drawn, with a word for the tooltip and for readers without the picture.
+struct LineIcon {
+  const char* name;
+  const char* word;
+  const char* drawing;
+};
+const LineIcon kLineIcons[] = {
+    {"I_D3M_Folder", "standard file",
+     "<path d=\"M1.5 4.5h5l1.5 1.5h6.5v7.5h-13z\" fill=\"#e8b64c\" stroke=\"#9a7321\"/>"},
+    {"I_D3M_Database", "PLM standard",
+     "<ellipse cx=\"8\" cy=\"4\" rx=\"5.5\" ry=\"2\" fill=\"#7fa7d9\" stroke=\"#2d548c\"/><path d=\"M2.5 "
+     "4v8c0 1.1 2.5 2 5.5 2s5.5-.9 5.5-2V4\" fill=\"#7fa7d9\" stroke=\"#2d548c\"/>"},
+};
+
+const LineIcon* FindLineIcon(const ZEPDlgCombo& iCombo, int iLine) {
+  ZEPString icon;
+  if (iCombo.GetLineIconName(icon, iLine) < 0 || icon.empty()) return nullptr;
+  for (const LineIcon& i : kLineIcons)
+    if (icon == i.name) return &i;
+  return nullptr;
+}
+
 void RenderCombo(const ZEPDialog& w, const ZEPAppRenderPage& iPage, const ZEPDlgCombo& combo, std::string& out) {
   std::string lines, selected;
+  const LineIcon* selectedIcon = nullptr;
   for (int i = 0; i < combo.GetLineCount(); ++i) {
     ZEPUnicodeString text;
     combo.GetLine(text, i);
+    const LineIcon* icon = FindLineIcon(combo, i);
     lines += (i ? "\n" : "") +
-             std::string(i == combo.GetSelect() ? "\xE2\x97\x8F " : "\xE2\x97\x8B ") + text.str();
-    if (i == combo.GetSelect()) selected = text.str();
+             std::string(i == combo.GetSelect() ? "\xE2\x97\x8F " : "\xE2\x97\x8B ") + text.str() +
+             (icon ? std::string(" (") + icon->word + ")" : std::string());
+    if (i == combo.GetSelect()) {
+      selected = text.str();
+      selectedIcon = icon;
+    }
   }
   std::string tip = w.GetTitle().str();
   if (!Tooltip(w).empty()) tip += (tip.empty() ? "" : ": ") + Tooltip(w);
@@ -209,7 +238,12 @@ void RenderCombo(const ZEPDialog& w, const ZEPAppRenderPage& iPage, const ZEPDlg
     out += "<span class=\"captioned\"" + (cell.empty() ? std::string() : " style=\"" + cell + "\"") +
            "><span class=\"label\">" + EscapeHtml(w.GetTitle().str()) + ":</span>";
   }
-  out += "<span" + Attributes(w, iPage, "combo", tip) + "><span class=\"value\">" + EscapeHtml(selected) +
+  std::string icon;
+  if (selectedIcon)
+    icon = std::string("<svg class=\"lineicon\" data-icon=\"") + selectedIcon->name +
+           "\" viewBox=\"0 0 16 16\" width=\"14\" height=\"14\" aria-hidden=\"true\">" + selectedIcon->drawing +
+           "</svg><span class=\"sr\">" + selectedIcon->word + ": </span>";
+  out += "<span" + Attributes(w, iPage, "combo", tip) + "><span class=\"value\">" + icon + EscapeHtml(selected) +
          "</span><span class=\"drop\">&#9660;</span></span>";
   if (captioned) out += "</span>";
 }
@@ -293,7 +327,9 @@ void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out)
     return;
   }
   if (auto* editor = ZEPSysDynamicCast<ZEPDlgEditor>(self)) {
-    out += "<span" + Attributes(w, iPage, "editor", Tooltip(w)) + "><span class=\"value\">" +
+    std::string tip = w.GetTitle().str();
+    if (!Tooltip(w).empty()) tip += (tip.empty() ? "" : ": ") + Tooltip(w);
+    out += "<span" + Attributes(w, iPage, "editor", tip) + "><span class=\"value\">" +
            EscapeHtml(editor->GetText().str()) + "</span></span>";
     return;
   }
