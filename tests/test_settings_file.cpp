@@ -189,6 +189,89 @@ TEST_F(SettingsFileTest, RoundTripKeepsEveryKindWithDefaultsAndLocks) {
   EXPECT_EQ(std::vector<int>{2}, Read<int>(opts, "DrwPaperLengthUnit", 1));
 }
 
+TEST_F(SettingsFileTest, TextsRoundTripLockAndKeepTheirKind) {
+  ScopedEnv who("USER", "alice");
+  WriteBytes(_admin, "{\"settings\": {\"DraftingOptions\": {\n"
+                     "  \"DrwStandard\": {\"text\": \"ISO\", \"locked\": true, \"by\": \"cad-admin\"},\n"
+                     "  \"DrwFolders\": {\"text\": []}}}}");
+  const std::vector<std::string> one = {"Folder"}, none = {},
+                                 awkward = {"Dr\xC3\xA4wings \xE6\x97\xA5", "say \"hi\"", "C:\\temp", "tab\tnl\n\x01\x1f", ""};
+  std::vector<std::string> read;
+  {
+    ZEPAppSettingsFile store;
+    ASSERT_EQ(S_OK, store.Load(_user.string(), _admin.string())) << store.LastError();
+    ZEPSysSettingRepository* opts = store.OpenSettings("DraftingOptions");
+    EXPECT_EQ(1, opts->ReadAttr("DrwStandard", read));
+    EXPECT_EQ(std::vector<std::string>{"ISO"}, read);
+    EXPECT_EQ(0, opts->WriteAttr("DrwStandard", one)) << "locked";
+    EXPECT_EQ(0, opts->ReadAttr("DrwFolders", read)) << "an empty list is a value";
+    EXPECT_EQ(1, opts->WriteAttr("One", one));
+    EXPECT_EQ(1, opts->WriteAttr("Awkward", awkward));
+    EXPECT_EQ(1, opts->WriteAttr("DrwFolders", none));
+    ASSERT_EQ(S_OK, opts->SaveRepository()) << store.LastError();
+    // A text is written as a scalar, as a single number is.
+    EXPECT_NE(std::string::npos, ReadBytes(_user).find("\"One\": {\n        \"text\": \"Folder\"\n")) << ReadBytes(_user);
+    EXPECT_NE(std::string::npos, ReadBytes(_user).find("\"text\": []")) << ReadBytes(_user);
+    // Locking at a text, and at the text an attribute shows.
+    EXPECT_EQ(S_OK, store.Lock("DraftingOptions", "Locked", std::vector<std::string>{"a", "b"})) << store.LastError();
+    EXPECT_EQ(S_OK, store.Lock("DraftingOptions", "Awkward")) << store.LastError();
+    EXPECT_EQ(0, opts->WriteAttr("Locked", one));
+    // What no file can hold is refused before anything is written.
+    const std::string admin = ReadBytes(_admin);
+    EXPECT_LT(store.SetAdminDefault("DraftingOptions", "Bad", std::vector<std::string>{"ok", "\xC3"}), 0);
+    EXPECT_NE(std::string::npos, store.LastError().find("text 2 is not valid UTF-8")) << store.LastError();
+    EXPECT_LT(store.Lock("DraftingOptions", "Bad", std::vector<std::string>{std::string("a\0b", 3)}), 0);
+    EXPECT_EQ(admin, ReadBytes(_admin));
+    const std::string user = ReadBytes(_user);
+    opts->SetUserValue("One", std::vector<std::string>{"\xFF"});
+    opts->WriteAttr("Other", one);
+    EXPECT_LT(opts->SaveRepository(), 0);
+    EXPECT_NE(std::string::npos, store.LastError().find("One cannot be saved: text 1")) << store.LastError();
+    EXPECT_EQ(user, ReadBytes(_user));
+  }
+
+  ZEPSysSettingRepository::CloseAll();
+  ZEPAppSettingsFile store;
+  ASSERT_EQ(S_OK, store.Load(_user.string(), _admin.string())) << store.LastError();
+  ZEPSysSettingRepository* opts = store.OpenSettings("DraftingOptions");
+  EXPECT_EQ(1, opts->ReadAttr("One", read));
+  EXPECT_EQ(one, read);
+  EXPECT_EQ(5, opts->ReadAttr("Awkward", read));
+  EXPECT_EQ(awkward, read);
+  EXPECT_TRUE(opts->IsLocked("Awkward"));
+  EXPECT_EQ(0, opts->ReadAttr("DrwFolders", read));
+  EXPECT_EQ(2, opts->ReadAttr("Locked", read));
+  EXPECT_EQ((std::vector<std::string>{"a", "b"}), read);
+  EXPECT_EQ("alice", store.AdminDoc().settings.at("DraftingOptions").at("Locked").by);
+
+  // A text where a number is expected, and the reverse, is a value of the wrong kind; a list
+  // of texts takes any number of them.
+  std::vector<ZEPAppAttrRule> rules(3);
+  rules[0] = {ZEPAppRepoKind::Setting, "DraftingOptions", "Len", 0, 1, {}};
+  rules[1] = {ZEPAppRepoKind::Setting, "DraftingOptions", "Std", 3, kAnyCount, {}};
+  rules[2] = {ZEPAppRepoKind::Setting, "DraftingOptions", "Stds", 3, kAnyCount, {}};
+  WriteBytes(_user, "{\"settings\": {\"DraftingOptions\": {\n"
+                    "  \"Len\": {\"text\": \"5\"},\n"
+                    "  \"Std\": {\"double\": 5},\n"
+                    "  \"Stds\": {\"text\": [\"ISO\", \"ANSI\", \"JIS\"]}}}}");
+  ZEPSysSettingRepository::CloseAll();
+  ZEPAppSettingsFile checked;
+  checked.SetRules(rules);
+  ASSERT_EQ(S_OK, checked.Load(_user.string(), (_dir / "other_admin.json").string()));
+  ASSERT_EQ(2u, checked.LoadWarnings().size());
+  EXPECT_EQ(_user.string() + ":2:19: settings/DraftingOptions/Len: holds \"text\" values, expected \"double\"; "
+                             "the default is used instead",
+            checked.LoadWarnings()[0].Text());
+  EXPECT_EQ(_user.string() + ":3:21: settings/DraftingOptions/Std: holds \"double\" values, expected \"text\"; "
+                             "the default is used instead",
+            checked.LoadWarnings()[1].Text());
+  opts = checked.OpenSettings("DraftingOptions");
+  EXPECT_FALSE(opts->HasUserValue("Len"));
+  EXPECT_EQ(3, opts->ReadAttr("Stds", read));
+  EXPECT_LT(checked.SetAdminDefault("DraftingOptions", "Len", std::vector<std::string>{"5"}), 0);
+  EXPECT_NE(std::string::npos, checked.LastError().find("expected \"double\"")) << checked.LastError();
+}
+
 TEST_F(SettingsFileTest, FailedSaveLeavesTheOldFileAndNoTemporaryFile) {
   auto ops = std::make_shared<FaultyOps>();
   ZEPAppSettingsFile store(ops);
@@ -349,6 +432,14 @@ TEST_F(SettingsFileTest, WrongTypesAreReportedAtTheValue) {
       {false, head + "\"Len\": {\"double\": [1, @@1e999]}}}}", "too large"},
       {false, head + "\"Len\": {\"double\": [1, @@null]}}}}", "finite number"},
       {false, head + "\"Len\": {\"double\": 2.0, @@\"int\": 2}}}}", "more than one"},
+      {false, head + "\"Std\": {\"int\": 2,\n @@\"text\": \"ISO\"}}}}",
+       "more than one of \"double\", \"int\", \"unsigned\" and \"text\""},
+      {false, head + "\"Std\": {\"text\": [\"ISO\", @@2]}}}}", "text[1]: expected a text, found 2"},
+      {false, head + "\"Std\": {\"text\": @@{}}}}}", "text: expected a text, found an object"},
+      {false, head + "\"Std\": {\"text\": [\"a\", @@\"b\\u0000\"]}}}}", "\\u0000"},
+      {false, head + "\"Std\": {\"text\": \"a\", @@\"txt\": 1}}}}",
+       "expected \"double\", \"int\", \"unsigned\" or \"text\""},
+      {true, head + "\"Std\": @@{\"by\": \"x\"}}}}", "no value: expected \"double\", \"int\", \"unsigned\" or \"text\""},
       {false, head + "\"Len\": @@4}}}", "expected an object"},
       {false, head + "\"Len\": @@{}}}}", "no value"},
       {false, head + "\"Unit\": {\"int\": 1, @@\"locked\": true}}}}", "administrator's file"},
@@ -390,23 +481,26 @@ TEST_F(SettingsFileTest, WrongTypesAreReportedAtTheValue) {
 }
 
 TEST_F(SettingsFileTest, InvalidUtf8IsReportedAtTheByte) {
-  // Line 3 holds four spaces, a quote, "M", "a" and "ß" before the bad byte: column 9.
-  for (const std::string bad : {"\xFF", "\xC0\xAF", "\xED\xA0\x80", "\xE2\x82", "\xF4\x90\x80\x80"}) {
-    const std::string text = "{\"settings\": {\n  \"DraftingOptions\": {\n    \"Ma\xC3\x9F" + bad +
-                             "\": {\"int\": 1}}}}\n";
-    WriteBytes(_user, text);
-    ZEPSysSettingRepository::CloseAll();
-    ZEPAppSettingsFile store;
-    ASSERT_EQ(E_FAIL, store.Load(_user.string()));
-    const ZEPAppFileError& e = store.LoadErrors().front();
-    EXPECT_EQ(std::make_pair(3, 9), std::make_pair(e.line, e.column)) << e.Text();
-    EXPECT_NE(std::string::npos, e.message.find("UTF-8"));
-    ZEPSysSettingRepository* repo = store.OpenSettings("DraftingOptions");
-    const int v = 1;
-    repo->WriteAttr("Unit", &v, 1);
-    EXPECT_LT(repo->SaveRepository(), 0);
-    EXPECT_EQ(text, ReadBytes(_user));
-  }
+  // Line 3 holds four spaces, a quote, "M", "a" and "ß" before the bad byte: column 9 in a
+  // name, column 25 in a text.
+  for (const std::string bad : {"\xFF", "\xC0\xAF", "\xED\xA0\x80", "\xE2\x82", "\xF4\x90\x80\x80"})
+    for (bool inText : {false, true}) {
+      const std::string text = "{\"settings\": {\n  \"DraftingOptions\": {\n    \"" +
+                               (inText ? "Std\": {\"text\": \"Ma\xC3\x9F" + bad + "\"}}}}\n"
+                                       : "Ma\xC3\x9F" + bad + "\": {\"int\": 1}}}}\n");
+      WriteBytes(_user, text);
+      ZEPSysSettingRepository::CloseAll();
+      ZEPAppSettingsFile store;
+      ASSERT_EQ(E_FAIL, store.Load(_user.string()));
+      const ZEPAppFileError& e = store.LoadErrors().front();
+      EXPECT_EQ(std::make_pair(3, inText ? 25 : 9), std::make_pair(e.line, e.column)) << e.Text();
+      EXPECT_NE(std::string::npos, e.message.find("UTF-8"));
+      ZEPSysSettingRepository* repo = store.OpenSettings("DraftingOptions");
+      const int v = 1;
+      repo->WriteAttr("Unit", &v, 1);
+      EXPECT_LT(repo->SaveRepository(), 0);
+      EXPECT_EQ(text, ReadBytes(_user));
+    }
 }
 
 TEST_F(SettingsFileTest, AnyInputIsReportedNeverACrash) {

@@ -32,7 +32,10 @@ std::string WrittenAsBefore(const ZEPAppSettingsDoc& iDoc, bool iAdmin) {
           std::visit(
               [&](const auto& values) {
                 using T = typename std::decay_t<decltype(values)>::value_type;
-                const char* type = std::is_same_v<T, double> ? "double" : std::is_same_v<T, int> ? "int" : "unsigned";
+                const char* type = std::is_same_v<T, double>         ? "double"
+                                   : std::is_same_v<T, int>          ? "int"
+                                   : std::is_same_v<T, unsigned int> ? "unsigned"
+                                                                     : "text";
                 e[type] = values.size() == 1 ? ojson(values.front()) : ojson(values);
               },
               *entry.value);
@@ -63,7 +66,7 @@ ZEPAppSettingsDoc RandomDoc(std::mt19937& ioRandom) {
       for (std::size_t a = pick(6); a > 0; --a) {
         ZEPAppAttrEntry& e = entries[names[pick(names.size())] + std::to_string(pick(3))];
         const std::size_t count = pick(7);
-        switch (pick(4)) {
+        switch (pick(5)) {
         case 0: {
           std::vector<double> v;
           for (std::size_t k = 0; k < count; ++k) {
@@ -87,6 +90,12 @@ ZEPAppSettingsDoc RandomDoc(std::mt19937& ioRandom) {
         }
         case 2: e.value = std::vector<unsigned int>(count, pick(2) ? UINT_MAX : static_cast<unsigned>(ioRandom()));
           break;
+        case 3: { // texts, with the names' escapes and characters
+          std::vector<std::string> v;
+          for (std::size_t k = 0; k < count; ++k) v.push_back(names[pick(names.size())] + (pick(2) ? "" : "\x1b\\"));
+          e.value = v;
+          break;
+        }
         default: break; // no value: a bare lock, or nothing to write
         }
         e.locked = pick(2) == 0;
@@ -131,6 +140,9 @@ TEST(SettingsText, SavedBytesAreThoseWrittenBefore) {
   doc.settings["DrwSketcherSpecific"]["Drw_GridColor"].value = std::vector<unsigned>{255, 0, 0};
   doc.settings["Empty"]["Nothing"] = {};
   doc.preferences["DraftingOptions"]["dlgPropTbBehaviorX"].value = std::vector<int>{-120};
+  doc.settings["DraftingOptions"]["DrwFolder"].value = std::vector<std::string>{"C:\\Dr\xC3\xA4wings \"A\"\n"};
+  doc.settings["DraftingOptions"]["DrwStandards"].value = std::vector<std::string>{"ISO", "\xE6\x97\xA5\x01"};
+  doc.settings["DraftingOptions"]["DrwNoStandards"] = {std::vector<std::string>{}, true, ""};
   std::string text, err;
   ASSERT_TRUE(FormatSettingsText(doc, true, text, err)) << err;
   const std::string golden = std::string(ZEP_GOLDEN_DIR) + "/settings_saved.json";
@@ -173,7 +185,12 @@ TEST(SettingsText, QuickReadingAnswersAsTheThoroughOne) {
            "\"A\": {\"locked\": truex, \"int\": 1}", "\"A\": {\"int\": 1}, \"A\": {\"int\": 1}",
            "\"B\": {\"int\": 1}, \"A\": {\"int\": 2}", "\"\\u0041\": {\"int\": 1}", "\"\\/\\b\": {\"int\": 1}",
            "\"\\x\": {\"int\": 1}", "\"\": {\"int\": 1}", "\"A\": {}", "\"A\": 1", "\"A\": {\"Int\": 1}",
-           "\"\t\": {\"int\": 1}", "\"\xC3\": {\"int\": 1}", "\"\xC3\x9F\": {\"int\": 1}"})
+           "\"\t\": {\"int\": 1}", "\"\xC3\": {\"int\": 1}", "\"\xC3\x9F\": {\"int\": 1}",
+           "\"A\": {\"text\": \"x\"}", "\"A\": {\"text\": []}", "\"A\": {\"text\": [\"\", \"\\\"\\\\\\n\"]}",
+           "\"A\": {\"text\": \"\\u00e9\"}", "\"A\": {\"text\": \"\\u0000\"}", "\"A\": {\"text\": \"\\ud800\"}",
+           "\"A\": {\"text\": [\"a\", 1]}", "\"A\": {\"text\": null}", "\"A\": {\"text\": [[\"a\"]]}",
+           "\"A\": {\"text\": \"a\", \"int\": 1}", "\"A\": {\"int\": 1, \"text\": \"a\"}",
+           "\"A\": {\"text\": \"\t\"}", "\"A\": {\"text\": \"\xC3\"}", "\"A\": {\"Text\": \"a\"}"})
     for (bool admin : {false, true}) {
       SCOPED_TRACE(body);
       ExpectSameReading(head + body + "}}}", admin);

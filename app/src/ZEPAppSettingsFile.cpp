@@ -13,6 +13,7 @@
 #include <tuple>
 #include <system_error>
 #include <utility>
+#include <variant>
 
 #include <pwd.h>
 #include <unistd.h>
@@ -44,7 +45,9 @@ bool ReadFile(const std::string& iPath, std::string& oText, bool& oExists, ZEPAp
   return ReadRegularFile(iPath, kMaxFileSize, oText, oExists, oError.message);
 }
 
-const char* const kTypeNames[] = {"double", "int", "unsigned"};
+// By index of the alternative in ZEPAppValue.
+const char* const kTypeNames[] = {"double", "int", "unsigned", "text"};
+static_assert(std::size(kTypeNames) == std::variant_size_v<ZEPAppValue>);
 
 // The system-wide administrator's file: the first folder of $XDG_CONFIG_DIRS that has one,
 // else where the first folder would hold it.
@@ -158,7 +161,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
       return std::string("holds \"") + kTypeNames[iValue.index()] + "\" values, expected \"" +
              kTypeNames[iRule.type] + "\"";
     const std::size_t n = std::visit([](const auto& v) { return v.size(); }, iValue);
-    if (n != iRule.count)
+    if (n != iRule.count && iRule.count != kAnyCount)
       return "holds " + std::to_string(n) + (n == 1 ? " value" : " values") + ", expected " +
              std::to_string(iRule.count);
     return iRule.check ? iRule.check(iValue) : std::string();
@@ -611,6 +614,7 @@ long ZEPAppSettingsFile::Lock(const std::string& iRepository, const std::string&
 long ZEPAppSettingsFile::Lock(const std::string& iRepository, const std::string& iAttribute, const ZEPAppValue& iValue,
                               ZEPAppRepoKind iKind) {
   if (!IsFinite(iValue)) return _pImpl->Fail(iAttribute + ": NaN and infinities cannot be stored");
+  if (std::string why = Unstorable(iValue); !why.empty()) return _pImpl->Fail(iAttribute + ": " + why);
   const std::string who = CurrentUserName();
   return _pImpl->EditAdmin(iKind, iRepository, iAttribute, [&](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) {
     e.value = iValue;
@@ -634,6 +638,7 @@ long ZEPAppSettingsFile::Unlock(const std::string& iRepository, const std::strin
 long ZEPAppSettingsFile::SetAdminDefault(const std::string& iRepository, const std::string& iAttribute,
                                          const ZEPAppValue& iValue, ZEPAppRepoKind iKind) {
   if (!IsFinite(iValue)) return _pImpl->Fail(iAttribute + ": NaN and infinities cannot be stored");
+  if (std::string why = Unstorable(iValue); !why.empty()) return _pImpl->Fail(iAttribute + ": " + why);
   return _pImpl->EditAdmin(iKind, iRepository, iAttribute, [&](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) {
     e.value = iValue;
     return S_OK;

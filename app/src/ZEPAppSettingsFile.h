@@ -33,13 +33,15 @@ struct ZEPAppSettingsPaths {
 // leaving one out never drops the system-wide locks.
 ZEPAppSettingsPaths ResolveSettingsPaths(const std::string& iUserOption = "", const std::string& iAdminOption = "");
 
+inline constexpr std::size_t kAnyCount = std::size_t(-1);
+
 // What a stored value must be to be used: its kind and count from the settings table and the
 // limits of the control that shows it.
 struct ZEPAppAttrRule {
   ZEPAppRepoKind kind = ZEPAppRepoKind::Setting;
   std::string repository, attribute;
-  std::size_t type = 0;  // index of the alternative in ZEPAppValue: 0 double, 1 int, 2 unsigned
-  std::size_t count = 1; // how many values
+  std::size_t type = 0;  // index of the alternative in ZEPAppValue: 0 double, 1 int, 2 unsigned, 3 text
+  std::size_t count = 1; // how many values; kAnyCount: any number, none included (a list of texts)
   // Why a value of the right kind and count is refused; empty when it is accepted. May be
   // left empty: no limits.
   std::function<std::string(const ZEPAppValue&)> check;

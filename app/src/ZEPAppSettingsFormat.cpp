@@ -23,7 +23,10 @@ constexpr std::size_t kNone = std::string::npos;
 constexpr int kMaxDepth = 32;
 constexpr std::size_t kMaxFaults = 20;
 
-const char* const kTypeKeys[] = {"double", "int", "unsigned"};
+const char* const kTypeKeys[] = {"double", "int", "unsigned", "text"};
+// The kinds as the messages list them.
+const char* const kKindsAnd = "\"double\", \"int\", \"unsigned\" and \"text\"";
+const char* const kKindsOr = "\"double\", \"int\", \"unsigned\" or \"text\"";
 
 std::size_t BomLength(const std::string& t) { return t.compare(0, 3, "\xEF\xBB\xBF") == 0 ? 3 : 0; }
 
@@ -271,7 +274,7 @@ private:
       const std::string ptr = iPtr + "/" + EscapePointer(key);
       const bool isType = std::find(std::begin(kTypeKeys), std::end(kTypeKeys), key) != std::end(kTypeKeys);
       if (isType) {
-        if (oEntry.value) Fault(KeyAt(ptr), iWhere + "holds more than one of \"double\", \"int\" and \"unsigned\"");
+        if (oEntry.value) Fault(KeyAt(ptr), iWhere + "holds more than one of " + kKindsAnd);
         else Values(key, value, ptr, iWhere, oEntry);
       } else if ((key == "locked" || key == "by") && !_admin) {
         Fault(KeyAt(ptr), iWhere + "\"" + key + "\" belongs in the administrator's file");
@@ -282,12 +285,12 @@ private:
         if (value.is_string()) oEntry.by = value.get<std::string>();
         else Fault(ValueAt(ptr), iWhere + "\"by\" must be a string, found " + Describe(value));
       } else {
-        Fault(KeyAt(ptr), iWhere + "unknown key \"" + key + "\"; expected \"double\", \"int\" or \"unsigned\"" +
+        Fault(KeyAt(ptr), iWhere + "unknown key \"" + key + "\"; expected " + kKindsOr +
                               (_admin ? ", \"locked\" or \"by\"" : ""));
       }
     }
     if (_faults.size() == before && !oEntry.value && !oEntry.locked)
-      Fault(ValueAt(iPtr), iWhere + "no value: expected \"double\", \"int\" or \"unsigned\"");
+      Fault(ValueAt(iPtr), iWhere + "no value: expected " + kKindsOr);
   }
 
   void Values(const std::string& iType, const json& iValues, const std::string& iPtr, const std::string& iWhere,
@@ -297,12 +300,22 @@ private:
     std::vector<double> d;
     std::vector<int> s;
     std::vector<unsigned int> u;
+    std::vector<std::string> texts;
     bool ok = true;
     for (std::size_t k = 0; k < n; ++k) {
       const json& v = scalar ? iValues : iValues[k];
       const std::string ptr = scalar ? iPtr : iPtr + "/" + std::to_string(k);
       const std::string where = iWhere + iType + (scalar ? "" : "[" + std::to_string(k) + "]") + ": ";
-      if (iType == "double") {
+      if (iType == "text") {
+        // The whole file is valid UTF-8 by now, and nlohmann refuses a \u escape of half a pair.
+        if (!v.is_string()) {
+          Fault(ValueAt(ptr), where + "expected a text, found " + Describe(v));
+          ok = false;
+        } else if (v.get_ref<const std::string&>().find('\0') != std::string::npos) {
+          Fault(ValueAt(ptr), where + "a text cannot hold the character \\u0000");
+          ok = false;
+        } else texts.push_back(v.get<std::string>());
+      } else if (iType == "double") {
         if (v.is_number() && std::isfinite(v.get<double>())) d.push_back(v.get<double>());
         else {
           Fault(ValueAt(ptr), where + "expected a finite number, found " + Describe(v));
@@ -333,6 +346,7 @@ private:
     }
     if (!ok) return;
     if (iType == "double") oEntry.value = std::move(d);
+    else if (iType == "text") oEntry.value = std::move(texts);
     else if (iType == "int") oEntry.value = std::move(s);
     else oEntry.value = std::move(u);
   }
@@ -374,6 +388,18 @@ bool IsFinite(const ZEPAppValue& iValue, std::size_t* oIndex) {
       return false;
     }
   return true;
+}
+
+std::string Unstorable(const ZEPAppValue& iValue) {
+  std::size_t bad = 0;
+  if (!IsFinite(iValue, &bad)) return "value " + std::to_string(bad + 1) + " is not a finite number";
+  if (const auto* texts = std::get_if<std::vector<std::string>>(&iValue))
+    for (std::size_t k = 0; k < texts->size(); ++k) {
+      const std::string& text = (*texts)[k];
+      if (ZEPFirstBadUtf8(text) != kNone) return "text " + std::to_string(k + 1) + " is not valid UTF-8";
+      if (text.find('\0') != kNone) return "text " + std::to_string(k + 1) + " holds a NUL character";
+    }
+  return "";
 }
 
 namespace {
@@ -515,11 +541,12 @@ private:
       do {
         Space();
         if (!String(_field) || !Colon()) return false;
-        if (_field == "double" || _field == "int" || _field == "unsigned") {
+        if (_field == "double" || _field == "int" || _field == "unsigned" || _field == "text") {
           if (oEntry.value) return false;
           const bool ok = _field[0] == 'd'   ? Values<double>(oEntry)
                           : _field[0] == 'i' ? Values<int>(oEntry)
-                                             : Values<unsigned int>(oEntry);
+                          : _field[0] == 'u' ? Values<unsigned int>(oEntry)
+                                             : Values<std::string>(oEntry);
           if (!ok) return false;
         } else if (_field == "locked" && _admin && !locked) {
           locked = true;
@@ -545,19 +572,22 @@ private:
         values.reserve(5);
         do {
           Space();
-          if (!Number(v)) return false;
+          if (!Item(v)) return false;
           values.push_back(v);
           Space();
         } while (Take(','));
         if (!Take(']')) return false;
       }
     } else {
-      if (!Number(v)) return false;
+      if (!Item(v)) return false;
       values.push_back(v);
     }
     oEntry.value = std::move(values);
     return true;
   }
+  // One value of a list: a number, or a text (String refuses \u escapes, so no NUL gets in).
+  template <class T> bool Item(T& oValue) { return Number(oValue); }
+  bool Item(std::string& oText) { return String(oText); }
 
   // A JSON number; oInteger: it has no fraction and no exponent.
   bool Token(const char*& oStart, bool& oInteger) {
@@ -794,12 +824,11 @@ bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string&
           oError = std::string(section) + "/" + repo + "/" + attr + " cannot be saved: its name is not valid UTF-8";
           return false;
         }
-        std::size_t bad = 0;
-        if (entry.value && !IsFinite(*entry.value, &bad)) {
-          oError = std::string(section) + "/" + repo + "/" + attr + " cannot be saved: value " +
-                   std::to_string(bad + 1) + " is not a finite number";
-          return false;
-        }
+        if (entry.value)
+          if (std::string why = Unstorable(*entry.value); !why.empty()) {
+            oError = std::string(section) + "/" + repo + "/" + attr + " cannot be saved: " + why;
+            return false;
+          }
         const bool locked = iAdmin && entry.locked, by = iAdmin && !entry.by.empty();
         if (!entry.value && !locked && !by) continue; // an attribute with nothing to write is left out
         if (!repoOpen) {

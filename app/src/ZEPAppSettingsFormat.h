@@ -6,7 +6,9 @@
 //       "DraftingOptions": {
 //         "DrwPaperLengthUnit": {"int": 1},
 //         "Drw_GridSpacing": {"double": [10.0, 20.0, 30.0, 40.0, 50.0]},
-//         "Drw_GridColor": {"unsigned": [255, 0, 0], "locked": true, "by": "cad-admin"}
+//         "Drw_GridColor": {"unsigned": [255, 0, 0], "locked": true, "by": "cad-admin"},
+//         "DrwStandards": {"text": ["ISO", "ANSI"]},
+//         "DrwFolder": {"text": "Folder"}
 //       }
 //     },
 //     "preferences": {
@@ -14,10 +16,11 @@
 //     }
 //   }
 //
-// Each attribute holds exactly one of "double", "int" or "unsigned": an array, or a scalar for
-// a single value. Only the administrator's file may add "locked" (a default is not a lock) and
-// "by", who locked it. "format" may be left out; anything else unknown is a fault rather than
-// something silently dropped at the next save.
+// Each attribute holds exactly one of "double", "int", "unsigned" or "text": an array, or a
+// scalar for a single value (so a list of one text reads back as one text: to the program both
+// are a list of texts). A list may be empty. Only the administrator's file may add "locked" (a
+// default is not a lock) and "by", who locked it. "format" may be left out; anything else
+// unknown is a fault rather than something silently dropped at the next save.
 #pragma once
 
 #include "ZEPSettings.h"
@@ -87,7 +90,8 @@ std::vector<ZEPAppFileError> ParseSettingsTextThoroughly(const std::string& iTex
                                                          bool iAdmin, ZEPAppSettingsDoc& oDoc);
 
 // Writes iDoc in the form above. False with oError when something cannot be written faithfully
-// (a NaN or infinity, a name that is not UTF-8); iAdmin keeps locks, else they are left out.
+// (a NaN or infinity, a name or text that is not UTF-8, a text holding a NUL); iAdmin keeps
+// locks, else they are left out.
 bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError);
 
 // A message about one place of a file that parsed, named by a JSON pointer
@@ -110,5 +114,8 @@ void LineAndColumn(const std::string& iText, std::size_t iOffset, int& oLine, in
 
 // Whether every double of iValue is finite; oIndex tells the first that is not.
 bool IsFinite(const ZEPAppValue& iValue, std::size_t* oIndex = nullptr);
+// Why iValue cannot be written to a file (a NaN or infinity, a text that is not UTF-8 or holds
+// a NUL, which no JSON text of ours carries); empty when it can.
+std::string Unstorable(const ZEPAppValue& iValue);
 
 } // namespace zepapp

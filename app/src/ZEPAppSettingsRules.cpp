@@ -9,6 +9,7 @@
 #include <map>
 #include <set>
 #include <type_traits>
+#include <variant>
 
 namespace zepapp {
 
@@ -84,6 +85,19 @@ template <class Values> std::string CheckEach(const Values& iValues, const Limit
   return "";
 }
 
+constexpr std::size_t kText = 3; // the alternative of ZEPAppValue that holds texts
+static_assert(std::is_same_v<std::variant_alternative_t<kText, ZEPAppValue>, std::vector<std::string>>);
+
+// The alternative of ZEPAppValue a stored kind is kept as; npos when the page does not say.
+// Every kind that is not a number is a list of texts.
+std::size_t TypeIndex(ZEPAppStored iKind) {
+  if (iKind == ZEPAppStored::Double) return 0;
+  if (iKind == ZEPAppStored::Int) return 1;
+  if (iKind == ZEPAppStored::UInt) return 2;
+  if (iKind == ZEPAppStored::Unsupported) return std::size_t(-1);
+  return kText;
+}
+
 } // namespace
 
 std::string FormatNumber(double iValue) {
@@ -109,11 +123,12 @@ std::vector<ZEPAppAttrRule> AppSettingRules() {
     rule.count = s.defaults.size();
     rule.type = std::size_t(-1); // any kind when the page does not say
     if (page)
-      if (auto kind = page->stored.find(s.attribute); kind != page->stored.end()) {
-        if (kind->second == ZEPAppStored::Double) rule.type = 0;
-        else if (kind->second == ZEPAppStored::Int) rule.type = 1;
-        else if (kind->second == ZEPAppStored::UInt) rule.type = 2;
-      }
+      if (auto kind = page->stored.find(s.attribute); kind != page->stored.end()) rule.type = TypeIndex(kind->second);
+    if (rule.type == kText) {
+      rule.count = kAnyCount; // one text or a list of any length: no limits either
+      rules.push_back(std::move(rule));
+      continue;
+    }
     const bool flag = page && page->flags.count(s.attribute) != 0;
     auto known = KnownLimits().find(s.stored);
     if (flag || known != KnownLimits().end()) {
