@@ -763,3 +763,186 @@ TEST_F(AppCli, RenderedDialogExplainsGreyControlsAndOpensTheAskedTab) {
   EXPECT_NE(missing.err.find((_dir / "nowhere").string() + "/catalogs"), std::string::npos) << missing.err;
   EXPECT_TRUE(missing.out.empty());
 }
+
+// ---- the main page: standards and scale ratios -----------------------------------------------
+// Every change is a run of its own: what the next run shows is what the file kept.
+TEST_F(AppCli, MainPageStandardsSurviveEachSaveAndReload) {
+  const std::string plm = (_dir / "plm.json").string();
+  std::ofstream(plm) << R"({"standards": [
+    {"name": "Soci\u00e9t\u00e9 \u6a19\u6e96", "key": "K-1"},
+    {"name": "Twin", "key": "K-2"}, {"name": "Twin", "key": "K-3", "unicity": 0},
+    {"name": "Unsure", "key": "K-4", "unicity": -1}]})";
+  auto run = [&](std::vector<std::string> iArgs) {
+    iArgs.insert(iArgs.begin(), {"--plm-repository", plm});
+    return Run(iArgs);
+  };
+  // A text or a list of texts of the user's file (a list of one is kept as one text).
+  auto texts = [&](const char* iAttribute) {
+    const nlohmann::json value = UserFile()["settings"]["DraftingOptions"][iAttribute]["text"];
+    return value.is_array() ? value.get<std::vector<std::string>>() : std::vector<std::string>{value};
+  };
+  using Texts = std::vector<std::string>;
+  const std::string societe = "Soci\xC3\xA9t\xC3\xA9 \xE6\xA8\x99\xE6\xBA\x96";
+
+  ASSERT_EQ(run({"set", "main", "cmbStandardName", "JIS"}).code, kExitOk);
+  EXPECT_EQ(texts("DrwStandardName"), Texts{"JIS"});
+  // Added through the chooser by name or key; the last one added is current.
+  for (const std::string& wanted : {societe, std::string("K-3"), std::string("K-2")}) {
+    Result added = run({"set", "main", "pusStandardPLMAdd", wanted});
+    ASSERT_EQ(added.code, kExitOk) << wanted << added.err;
+  }
+  EXPECT_EQ(texts("DrwStandardPLMList"), (Texts{societe, "Twin", "Twin"}));
+  EXPECT_EQ(texts("DrwStandardPLMIDList"), (Texts{"K-1", "K-3", "K-2"}));
+  EXPECT_EQ(texts("DrwStandardName"), Texts{"K-2"});
+  EXPECT_EQ(Stored("DraftingOptions", "DrwIsStandardPLM"), std::vector<double>{1});
+  const struct {
+    const char* control;
+    const char* value;
+    int code;
+    const char* told;
+  } refused[] = {
+      {"pusStandardPLMAdd", "Twin", kExitBadValue, "keys K-2, K-3"},
+      {"pusStandardPLMAdd", "Nobody", kExitBadValue, "Unsure  (key K-4)"},
+      {"pusStandardPLMAdd", "K-4", kExitBadValue, "does not guarantee the key K-4"},
+      {"pusStandardPLMAdd", "K-1", kExitOk, "listed already"},
+      {"cmbStandardName", "Twin", kExitBadValue, "(PLM standard, key K-3)"},
+      {"pusStandardPLMRemove", "K-9", kExitBadValue, "Twin  (key K-2)"},
+  };
+  const std::string before = ReadBytes(_settings);
+  for (const auto& r : refused) {
+    Result result = run({"set", "main", r.control, r.value});
+    EXPECT_EQ(result.code, r.code) << r.value;
+    EXPECT_NE((result.err + result.out).find(r.told), std::string::npos) << r.value << ": " << result.err;
+  }
+  EXPECT_EQ(ReadBytes(_settings), before);
+
+  // Two standards of one name: each line is its own, by its key.
+  ASSERT_EQ(run({"set", "main", "cmbStandardName", "K-3"}).code, kExitOk);
+  EXPECT_EQ(texts("DrwStandardName"), Texts{"K-3"});
+  EXPECT_EQ(run({"get", "main", "cmbStandardName"}).out, "Twin\n");
+  EXPECT_EQ(run({"get", "DrwStandardName", "--raw"}).out, "K-3\n");
+  // Removing another keeps the current standard; removing the current one brings the default.
+  ASSERT_EQ(run({"set", "main", "pusStandardPLMRemove", "K-2"}).code, kExitOk);
+  EXPECT_EQ(texts("DrwStandardName"), Texts{"K-3"});
+  ASSERT_EQ(run({"set", "main", "pusStandardPLMRemove", "Twin"}).code, kExitOk);
+  EXPECT_EQ(texts("DrwStandardName"), Texts{"ISO"});
+  EXPECT_EQ(Stored("DraftingOptions", "DrwIsStandardPLM"), std::vector<double>{0});
+  EXPECT_EQ(texts("DrwStandardPLMList"), Texts{societe});
+  EXPECT_EQ(texts("DrwStandardPLMIDList"), Texts{"K-1"});
+
+  // JSON: one text as a string, a list as an array of strings.
+  const nlohmann::json name = nlohmann::json::parse(run({"get", "DrwStandardName", "--json"}).out);
+  EXPECT_EQ(name["stored"], "ISO");
+  EXPECT_EQ(name["kind"], "combo");
+  std::map<std::string, nlohmann::json> listed;
+  for (const auto& s : nlohmann::json::parse(run({"list", "--json"}).out))
+    if (s["page"] == "main") listed[s["attribute"]] = s["stored"];
+  EXPECT_EQ(listed["DrwStandardPLMList"], nlohmann::json::array({societe}));
+  EXPECT_EQ(listed["DrwStandardPLMIDList"], nlohmann::json::array({"K-1"}));
+
+  // The standard combo's settings are locked together: no PLM standard can be added then.
+  ASSERT_EQ(run({"lock", "main", "cmbStandardName", "JIS"}).code, kExitOk);
+  const nlohmann::json admin = nlohmann::json::parse(ReadBytes(_admin))["settings"]["DraftingOptions"];
+  EXPECT_EQ(admin["DrwStandardName"]["text"], "JIS");
+  EXPECT_EQ(admin["DrwStandardPLMIDList"]["locked"], true);
+  EXPECT_EQ(run({"get", "main", "cmbStandardName"}).out, "JIS\n");
+  EXPECT_EQ(run({"set", "main", "pusStandardPLMAdd", "K-2"}).code, kExitRefused);
+  EXPECT_EQ(run({"set", "main", "pusStandardPLMRemove", "K-1"}).code, kExitRefused);
+  EXPECT_EQ(nlohmann::json::parse(run({"locks", "--json"}).out).size(), 4u);
+  ASSERT_EQ(run({"unlock", "DrwStandardName"}).code, kExitOk);
+  EXPECT_TRUE(nlohmann::json::parse(run({"locks", "--json"}).out)[0]["locked"] == false);
+}
+
+TEST_F(AppCli, ScaleRatiosPerRangeAndTheTitleBlockFolder) {
+  ASSERT_EQ(Run({"set", "main", "edtScaleRatio", "1:50"}).code, kExitOk);
+  ASSERT_EQ(Run({"set", "main", "edtScaleRatio", "50", "--range", "2"}).code, kExitOk);
+  std::vector<double> ratios = FindSetting("Main", "ScaleRatio")->defaults;
+  ratios[0] = 0.02;
+  ratios[1] = 50;
+  EXPECT_EQ(Stored("DraftingOptions", "DrwScaleRatio"), ratios);
+  EXPECT_EQ(Run({"get", "main", "edtScaleRatio"}).out, "1:50\n");
+  EXPECT_EQ(Run({"get", "main", "edtScaleRatio", "--range", "2"}).out, "50:1\n");
+  EXPECT_EQ(Run({"get", "main", "edtScaleRatioDec"}).out, "0.02\n");
+  EXPECT_EQ(Run({"set", "main", "edtScaleRatio", "1/50"}).out, "Scale ratio: 1:50 (unchanged)  (scale range 1: Normal)\n");
+  const std::string before = ReadBytes(_settings);
+  const struct {
+    std::vector<std::string> args;
+    const char* told;
+  } refused[] = {{{"abc"}, "not a scale ratio"},
+                 {{"0"}, "not a scale ratio"},
+                 {{"1:50", "--range", "2"}, "from 0.1 to 100000"},
+                 {{"1:5000"}, "outside the limits"}};
+  for (const auto& r : refused) {
+    std::vector<std::string> args = {"set", "main", "edtScaleRatio"};
+    args.insert(args.end(), r.args.begin(), r.args.end());
+    Result result = Run(args);
+    EXPECT_EQ(result.code, kExitBadValue) << r.args[0];
+    EXPECT_NE(result.err.find(r.told), std::string::npos) << r.args[0] << ": " << result.err;
+  }
+  EXPECT_EQ(Run({"set", "main", "edtScaleRatioDec", "3"}).code, kExitRefused); // it only shows the ratio
+
+  // The folder: a text kept as typed; a folder this computer lacks is only warned about.
+  const std::string folder = (_dir / "Cartouches \xC3\xA9t\xC3\xA9").string();
+  fs::create_directories(folder);
+  Result set = Run({"set", "administration", "FrameAndTitleBlockPath", folder});
+  ASSERT_EQ(set.code, kExitOk) << set.err;
+  EXPECT_TRUE(set.err.empty()) << set.err;
+  EXPECT_EQ(Run({"get", "DrwFolderTitleBlock"}).out, folder + "\n");
+  Result missing = Run({"set", "administration", "FrameAndTitleBlockPath", "/no/such/folder"});
+  EXPECT_EQ(missing.code, kExitOk);
+  EXPECT_NE(missing.err.find("warning: there is no folder \"/no/such/folder\""), std::string::npos);
+  EXPECT_EQ(nlohmann::json::parse(Run({"get", "DrwFolderTitleBlock", "--json"}).out)["stored"], "/no/such/folder");
+  const std::string kept = ReadBytes(_settings);
+  for (const char* bad : {"", "  ", "bad \xC3", "two\nlines"}) {
+    Result r = Run({"set", "administration", "FrameAndTitleBlockPath", bad});
+    EXPECT_EQ(r.code, kExitBadValue) << bad;
+  }
+  EXPECT_EQ(ReadBytes(_settings), kept);
+  ASSERT_EQ(Run({"reset", "DrwFolderTitleBlock"}).code, kExitOk);
+  EXPECT_EQ(Run({"get", "DrwFolderTitleBlock"}).out, "\n");
+}
+
+TEST_F(AppCli, StandardsFolderAndAFaultyPLMRepository) {
+  const fs::path standards = _dir / "standards";
+  fs::create_directories(standards / "drafting");
+  for (const char* file : {"Shop.xml", "readme.txt", "Yard.XML"}) std::ofstream(standards / "drafting" / file) << "<x/>";
+  setenv("DRAFTING_OPTIONS_STANDARDS", standards.c_str(), 1);
+  Result chosen = Run({"set", "main", "cmbStandardName", "yard"});
+  unsetenv("DRAFTING_OPTIONS_STANDARDS");
+  ASSERT_EQ(chosen.code, kExitOk) << chosen.err;
+  EXPECT_EQ(chosen.out, "Drafting standard: Yard\n");
+  Result missing = Run({"--standards", (_dir / "none").string(), "get", "main", "cmbStandardName"});
+  EXPECT_EQ(missing.code, kExitOk);
+  EXPECT_NE(missing.err.find("no folder standard is offered"), std::string::npos) << missing.err;
+
+  // A repository file the chooser cannot use: said where, and nothing is written.
+  const std::string plm = (_dir / "plm.json").string();
+  const std::string before = ReadBytes(_settings);
+  const struct {
+    const char* text;
+    const char* told;
+  } faulty[] = {
+      {"{\"standards\": [", ":1:16: not JSON"},
+      {"{\"standards\": {}}", ":1:15: \"standards\" must be an array"},
+      {"{\"standards\": [{\"name\": \"A\"}]}", ":1:16: this standard has no \"key\""},
+      {"{\"standards\": [{\"name\": \"A\", \"key\": \"k\"},\n {\"name\": \"B\", \"key\": \"k\"}]}", ":2:23: the key \"k\" is given twice"},
+      {"{\"standards\": [{\"name\": \"A\", \"key\": \"k\", \"owner\": 1}]}", ":1:42: unknown member \"owner\""},
+      {"{\"standards\": [{\"name\": \"A\", \"key\": \"k\", \"unicity\": \"high\"}]}", ":1:53: \"unicity\" must be a whole number"},
+  };
+  for (const auto& f : faulty) {
+    std::ofstream(plm, std::ios::binary | std::ios::trunc) << f.text;
+    Result r = Run({"--plm-repository", plm, "set", "main", "pusStandardPLMAdd", "A"});
+    EXPECT_EQ(r.code, kExitFile) << f.text;
+    EXPECT_NE(r.err.find(plm + f.told), std::string::npos) << r.err;
+  }
+  EXPECT_EQ(Run({"--plm-repository", _dir.string(), "set", "main", "pusStandardPLMAdd", "A"}).code, kExitFile);
+  EXPECT_EQ(ReadBytes(_settings), before);
+  // The shipped sample is found like the catalogs, and lists the standards the chooser offers.
+  Result sample = Run({"set", "main", "pusStandardPLMAdd", "Supplier drafting standard"});
+  EXPECT_EQ(sample.code, kExitOk) << sample.err;
+  // The rendered combo tells PLM lines from folder lines.
+  const std::string html = Run({"render", "--html", "-", "main"}).out;
+  EXPECT_NE(html.find("data-icon=\"I_D3M_Database\""), std::string::npos);
+  EXPECT_NE(html.find("ISO (standard file)"), std::string::npos);
+  EXPECT_NE(html.find("Supplier drafting standard (PLM standard)"), std::string::npos);
+}

@@ -321,7 +321,10 @@ public:
         if (!section.empty()) _out << "  " << section << "\n";
       }
       std::string marks;
-      if (c.Kind() == ZEPAppKind::Push) marks += "  (button: opens a dialog)";
+      if (c.Kind() == ZEPAppKind::Push)
+        marks += c.name == "pusStandardPLMAdd"      ? "  (button: give it a PLM standard's name or key to add)"
+                 : c.name == "pusStandardPLMRemove" ? "  (button: give it a listed PLM standard to remove)"
+                                                    : "  (button: opens a dialog)";
       if (c.Locked())
         marks += "  \xF0\x9F\x94\x92 " + c.LockText();
       else if (c.Disabled())

@@ -125,7 +125,8 @@ std::vector<ZEPAppAttrRule> AppSettingRules() {
     if (page)
       if (auto kind = page->stored.find(s.attribute); kind != page->stored.end()) rule.type = TypeIndex(kind->second);
     if (rule.type == kText) {
-      rule.count = kAnyCount; // one text or a list of any length: no limits either
+      // One text, or a list of any length; no limits either.
+      rule.count = page->stored.at(s.attribute) == ZEPAppStored::TextList ? kAnyCount : 1;
       rules.push_back(std::move(rule));
       continue;
     }
