@@ -256,7 +256,7 @@ public:
     oControls = PageControls(Open(iPage), iPage.dialogButtons);
     if (iRange == 0) return kExitOk;
     if (ShownRange(oControls) == 0) {
-      _err << "error: --range applies to the grid page only\n";
+      _err << "error: --range applies to the pages with a scale range only (grid, main)\n";
       return kExitUsage;
     }
     const ZEPAppOutcome outcome = SelectRange(oControls, iRange);
@@ -758,7 +758,8 @@ int Render(const Request& iRequest, std::ostream& out, std::ostream& err) {
     if (ShownRange(controls)) {
       if (int rc = session.Controls(*page, iRequest.range, controls)) return rc;
       ranged = true;
-      note = "Spacing and graduations of the " + ScaleName(ShownRange(controls)) + " scale range";
+      note = std::string(page->name == "main" ? "Scale ratio" : "Spacing and graduations") + " of the " +
+             ScaleName(ShownRange(controls)) + " scale range";
     }
     ZEPAppRenderPage shown{page->name, page->title, session.Open(*page), note, {}, {}};
     for (const ZEPAppControl& c : controls)
@@ -768,7 +769,7 @@ int Render(const Request& iRequest, std::ostream& out, std::ostream& err) {
     rendered.push_back(shown);
   }
   if (iRequest.range && !ranged) {
-    err << "error: --range applies to the grid page only\n";
+    err << "error: --range applies to the pages with a scale range only (grid, main)\n";
     return kExitUsage;
   }
   ZEPAppRenderContext context{session.Paths().user, session.Paths().admin,
@@ -814,14 +815,15 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
                  "The PLM repository file whose standards the PLM chooser lists (default: $" +
                      std::string(kPLMRepositoryEnv) + ", else the sample plm/standards.json of the resources)");
   auto rangeOption = [&r](CLI::App* cmd) {
-    cmd->add_option("--range", r.range, "Grid page: the scale range to work on, 1 to 5")
+    cmd->add_option("--range", r.range, "Grid and main pages: the scale range to work on, 1 to 5")
         ->check(CLI::Range(1, 5));
   };
 
   const std::string keyHelp = "The setting: PAGE CONTROL, PAGE.CONTROL or its stored attribute (see show)";
   const std::string valueHelp =
       "on/off for a check box; a number with an optional unit (25mm, 2.5cm, 1in, 15deg) for a spinner; a line "
-      "number from 1 or a line's text for a combo or a group of radio buttons";
+      "number from 1 or a line's text for a combo or a group of radio buttons; a text for an editor (a scale "
+      "ratio as 1:50 for edtScaleRatio); a PLM standard's name or key for the main page's add and remove buttons";
   auto keyArgs = [&r](CLI::App* cmd, const std::string& iHelp, int iMin, int iMax) {
     cmd->add_option("key", r.args, iHelp)->expected(iMin, iMax);
   };
@@ -847,7 +849,9 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
   keyArgs(set, keyHelp + ", then the value: " + valueHelp, 2, 3);
   rangeOption(set);
   set->footer("Examples:\n  " + std::string(kAppName) + " set grid editorGridSpacing 2.5cm --range 2\n  " +
-              kAppName + " set general.checkViewFrame off\n  " + kAppName + " set DrwPaperLengthUnit inch");
+              kAppName + " set general.checkViewFrame off\n  " + kAppName + " set DrwPaperLengthUnit inch\n  " +
+              kAppName + " set main pusStandardPLMAdd \"Supplier drafting standard\"\n  " + kAppName +
+              " set main edtScaleRatio 1:50 --range 2");
   CLI::App* reset = app.add_subcommand("reset", "Put a setting back to its default (every scale range), or all");
   keyArgs(reset, keyHelp, 0, 2);
   reset->add_flag("--all", r.all, "Every setting the administrator has not locked");
