@@ -911,6 +911,9 @@ TEST_F(AppCli, StandardsFolderAndAFaultyPLMRepository) {
   unsetenv("DRAFTING_OPTIONS_STANDARDS");
   ASSERT_EQ(chosen.code, kExitOk) << chosen.err;
   EXPECT_EQ(chosen.out, "Drafting standard: Yard\n");
+  // Among the samples "Yard" is no choice: shown as an extra first line, the others after it.
+  EXPECT_NE(Run({"set", "main", "cmbStandardName", "1"}).out.find("Yard (not offered) (unchanged)"), std::string::npos);
+  EXPECT_EQ(Run({"set", "main", "cmbStandardName", "2"}).out, "Drafting standard: ANSI\n");
   Result missing = Run({"--standards", (_dir / "none").string(), "get", "main", "cmbStandardName"});
   EXPECT_EQ(missing.code, kExitOk);
   EXPECT_NE(missing.err.find("no folder standard is offered"), std::string::npos) << missing.err;

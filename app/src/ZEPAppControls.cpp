@@ -388,8 +388,12 @@ std::string ZEPAppControl::Shown() const {
   case ZEPAppKind::Combo: {
     const ZEPDlgCombo* combo = PickableCombo(inner);
     ZEPUnicodeString text;
-    if (combo->GetLine(text, combo->GetSelect()) < 0) return "(none)";
-    return text.str();
+    if (combo->GetLine(text, combo->GetSelect()) >= 0) return text.str();
+    // The current standard in neither list: the page shows it as a first line it does not select.
+    const std::vector<std::string> current = name == kStandardCombo ? StoredTexts("StandardName") : std::vector<std::string>();
+    if (!current.empty() && combo->GetLine(text, 0) >= 0 && text.str() == current.front())
+      return text.str() + " (not offered)";
+    return "(none)";
   }
   case ZEPAppKind::Choice:
     for (ZEPDlgRadioButton* radio : Radios(inner))
@@ -805,15 +809,23 @@ ZEPAppOutcome OperateNewerDialog(const ZEPAppControl& iControl, const std::strin
 // from the open list as the user does (the page rebuilds the lines as it opens and closes).
 ZEPAppOutcome ChooseStandard(const ZEPAppControl& iControl, const std::string& iText) {
   const ZEPDlgCombo* combo = PickableCombo(iControl.inner);
-  if (!ZEPDlgDriver::DropDown(iControl.inner)) return Refused(iControl);
-  const std::vector<StandardLine> lines = StandardLines(*combo);
+  // Numbers and texts are those of the closed combo, as show lists them: a current name that is
+  // in neither list is its line 1 then, and is no line of the open list.
+  const std::vector<StandardLine> shown = StandardLines(*combo);
   int line = -1;
   std::vector<std::string> texts;
-  for (std::size_t i = 0; i < lines.size(); ++i) {
-    texts.push_back(lines[i].text);
-    if (!lines[i].key.empty() && lines[i].key == Trim(iText)) line = static_cast<int>(i);
+  for (std::size_t i = 0; i < shown.size(); ++i) {
+    texts.push_back(shown[i].text);
+    if (!shown[i].key.empty() && shown[i].key == Trim(iText)) line = static_cast<int>(i);
   }
   if (line < 0) line = FindLine(texts, iText);
+  if (!ZEPDlgDriver::DropDown(iControl.inner)) return Refused(iControl);
+  const int extra = static_cast<int>(shown.size()) - combo->GetLineCount(); // 1 with that line
+  if (line >= 0 && line < extra) {
+    ZEPDlgDriver::CloseUp(iControl.inner);
+    return Done(iControl, false); // the current name itself
+  }
+  line -= line >= 0 ? extra : 0;
   const int selected = combo->GetSelect();
   const bool picked = line >= 0 && line != selected && ZEPDlgDriver::Select(iControl.inner, line);
   ZEPDlgDriver::CloseUp(iControl.inner);

@@ -38,7 +38,8 @@ std::string UseStandardsFolder(const std::string& iFolder) {
   if (!std::filesystem::is_directory(iFolder, ec))
     return "no standards folder " + iFolder + ": no folder standard is offered";
   if (!std::filesystem::is_directory(iFolder + "/drafting", ec))
-    return "the standards folder " + iFolder + " has no \"drafting\" folder: no folder standard is offered";
+    return "the standards folder " + iFolder +
+           " has no \"drafting\" folder: no folder standard is offered";
   return "";
 }
 
@@ -84,26 +85,32 @@ bool LoadPLMRepository(const std::string& iPath, std::string& oError) {
     const std::string at = std::to_string(i);
     const nlohmann::json& entry = list[i];
     if (!entry.is_object())
-      return fault({"standards", at}, false, "a standard is an object with \"name\", \"key\" and \"unicity\"");
+      return fault({"standards", at}, false,
+                   "a standard is an object with \"name\", \"key\" and \"unicity\"");
     ZEPPLMSetup::Standard standard;
     for (const auto& [member, value] : entry.items()) {
       if (member == "name" || member == "key") {
         if (!value.is_string() || value.get<std::string>().empty())
-          return fault({"standards", at, member}, false, "\"" + member + "\" must be a text that is not empty");
+          return fault({"standards", at, member}, false,
+                       "\"" + member + "\" must be a text that is not empty");
         (member == "name" ? standard.name : standard.key) = value.get<std::string>();
       } else if (member == "unicity") {
-        if (!value.is_number_integer() || value.get<long long>() < -1000000 || value.get<long long>() > 1000000)
+        if (!value.is_number_integer() || value.get<long long>() < -1000000 ||
+            value.get<long long>() > 1000000)
           return fault({"standards", at, member}, false, "\"unicity\" must be a whole number");
         standard.unicity = value.get<int>();
       } else {
         return fault({"standards", at, member}, true, "unknown member \"" + member + "\"");
       }
     }
-    if (standard.name.empty()) return fault({"standards", at}, false, "this standard has no \"name\"");
-    if (standard.key.empty()) return fault({"standards", at}, false, "this standard has no \"key\"");
+    if (standard.name.empty())
+      return fault({"standards", at}, false, "this standard has no \"name\"");
+    if (standard.key.empty())
+      return fault({"standards", at}, false, "this standard has no \"key\"");
     // Keys are what the settings keep: two standards with one key could not be told apart.
     if (!keys.insert(standard.key).second)
-      return fault({"standards", at, "key"}, false, "the key \"" + standard.key + "\" is given twice");
+      return fault({"standards", at, "key"}, false,
+                   "the key \"" + standard.key + "\" is given twice");
     standards.push_back(std::move(standard));
   }
   ZEPPLMSetup::SetRepository(std::move(standards));
