@@ -900,6 +900,10 @@ TEST_F(AppCli, ScaleRatiosPerRangeAndTheTitleBlockFolder) {
   EXPECT_EQ(ReadBytes(_settings), kept);
   ASSERT_EQ(Run({"reset", "DrwFolderTitleBlock"}).code, kExitOk);
   EXPECT_EQ(Run({"get", "DrwFolderTitleBlock"}).out, "\n");
+  // The administrator locks it at a text.
+  ASSERT_EQ(Run({"lock", "administration", "FrameAndTitleBlockPath", folder}).code, kExitOk);
+  EXPECT_EQ(nlohmann::json::parse(Run({"locks", "--json"}).out)[0]["value"], folder);
+  EXPECT_EQ(Run({"set", "DrwFolderTitleBlock", "/elsewhere"}).code, kExitRefused);
 }
 
 TEST_F(AppCli, StandardsFolderAndAFaultyPLMRepository) {

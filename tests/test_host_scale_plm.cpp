@@ -110,3 +110,27 @@ TEST_F(HostToolkitExtras, AFatherIsForgottenWhenItDiesAndNeverMadeACycle) {
   ZEPDlgDriver::Idle();
   EXPECT_EQ(command.GetFather(), nullptr);
 }
+
+// A chooser offers the repository's standards once asked for the drafting standard type.
+TEST_F(HostToolkitExtras, TheChooserListsTheRepositoryForTheStandardTypeOnly) {
+  ZEPPLMSetup::SetRepository({{"Company", "K-1"}, {"Company", "K-2", -1}});
+  ZEPIPLMChooserFactory* factory = nullptr;
+  ASSERT_EQ(ZEPPLMUIBasicServices::GetPLMChooserFactory(factory), S_OK);
+  ZEPIPLMChooser* chooser = nullptr;
+  factory->CreatePLMChooser(&_root, "chooser", chooser);
+  factory->Release();
+  ASSERT_NE(chooser, nullptr);
+  EXPECT_TRUE(ZEPPLMSetup::Listed(chooser).empty());
+  ZEPIType_var type;
+  ZEPCkeTypeProtectedServices::RetrieveKnowledgeType("DIFStandardRep", type);
+  ZEPListValZEPIType_var types;
+  types.Append(type);
+  chooser->SetTypes(types);
+  const std::vector<ZEPPLMSetup::Standard> listed = ZEPPLMSetup::Listed(chooser);
+  ASSERT_EQ(listed.size(), 2u);
+  EXPECT_EQ(listed[1].key, "K-2");
+  EXPECT_EQ(listed[1].unicity, -1);
+  chooser->Release();
+  ZEPPLMSetup::Reset();
+  EXPECT_TRUE(ZEPPLMSetup::Repository().empty());
+}
