@@ -955,7 +955,8 @@ ZEPAppOutcome EnterRatio(const ZEPAppControl& iControl, const std::string& iText
   double low = 0, high = 0;
   if (!RatioBounds(range, low, high))
     return Fail(kExitBadValue, "no scale ratio is accepted at this scale range: the host gives it no tolerances");
-  if (value < low || value > high) return BadValue(iControl, Number(value) + " is outside the limits");
+  if (value < low || value > high)
+    return BadValue(iControl, Quoted(iText) + " (" + Number(value) + ") is outside the limits");
   auto* editor = ZEPSysDynamicCast<ZEPDlgEditor>(iControl.inner);
   const bool same = SUCCEEDED(ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(
                         editor->GetText(), shownNormal, shown, form)) &&
