@@ -613,7 +613,8 @@ int Administer(const Request& iRequest, AdminAction iAction, std::ostream& out, 
       if (const ZEPSysSettingRepository* repo = ZEPSysSettingRepository::GetRepository(rows[i]->repository.c_str()))
         if (const ZEPAppValue* now = repo->Effective(rows[i]->stored)) values[i] = *now;
   }
-  const std::string& attribute = setting->stored;
+  std::string attribute; // the stored attributes, for the messages
+  for (const ZEPAppSetting* row : rows) attribute += (attribute.empty() ? "" : ", ") + row->stored;
   long rc = 1; // 1: nothing to do for any of the rows
   for (std::size_t i = 0; i < rows.size() && SUCCEEDED(rc); ++i) {
     const std::string& repository = rows[i]->repository;
@@ -641,7 +642,8 @@ int Administer(const Request& iRequest, AdminAction iAction, std::ostream& out, 
     return kExitFile;
   }
   if (rc == 1) {
-    out << attribute << (iAction == AdminAction::Unlock ? " was not locked" : " had no default")
+    out << attribute
+        << (iAction != AdminAction::Unlock ? " had no default" : rows.size() > 1 ? " were not locked" : " was not locked")
         << "; nothing changed\n";
     return kExitOk;
   }
