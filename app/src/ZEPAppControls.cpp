@@ -609,6 +609,9 @@ std::string WhyRefused(const std::vector<ZEPAppControl>& iControls, const ZEPApp
     return title + " is disabled while " + Quoted(choice->Title()) + " is " + Quoted(shown) +
            "; choose " + wanted + " (" + choice->name + ") first";
   }
+  if (iControl.name == kRemovePLMStandard)
+    return title + " is enabled while a PLM standard is current; set it to a listed PLM standard, which it makes "
+                   "current first";
   return title + " is disabled on this page";
 }
 
