@@ -935,6 +935,7 @@ TEST_F(AppCli, StandardsFolderAndAFaultyPLMRepository) {
       {"{\"standards\": [{\"name\": \"A\", \"key\": \"k\"},\n {\"name\": \"B\", \"key\": \"k\"}]}", ":2:23: the key \"k\" is given twice"},
       {"{\"standards\": [{\"name\": \"A\", \"key\": \"k\", \"owner\": 1}]}", ":1:42: unknown member \"owner\""},
       {"{\"standards\": [{\"name\": \"A\", \"key\": \"k\", \"unicity\": \"high\"}]}", ":1:53: \"unicity\" must be a whole number"},
+      {"{\"standards\": [{\"name\": \"A\\nB\", \"key\": \"k\"}]}", ":1:25: \"name\" must be a text that is not empty"},
   };
   for (const auto& f : faulty) {
     std::ofstream(plm, std::ios::binary | std::ios::trunc) << f.text;
@@ -944,6 +945,13 @@ TEST_F(AppCli, StandardsFolderAndAFaultyPLMRepository) {
   }
   EXPECT_EQ(Run({"--plm-repository", _dir.string(), "set", "main", "pusStandardPLMAdd", "A"}).code, kExitFile);
   EXPECT_EQ(ReadBytes(_settings), before);
+  // Names and keys that do not pair up (a file edited by hand) are pointed out.
+  std::ofstream(_settings, std::ios::trunc)
+      << R"({"settings": {"DraftingOptions": {"DrwStandardPLMList": {"text": ["A", "B"]},
+                                               "DrwStandardPLMIDList": {"text": "k"}}}})";
+  EXPECT_NE(Run({"get", "main", "cmbStandardName"}).err.find("holds 2 names and DrwStandardPLMIDList 1 keys"),
+            std::string::npos);
+  fs::remove(_settings);
   // The shipped sample is found like the catalogs, and lists the standards the chooser offers.
   Result sample = Run({"set", "main", "pusStandardPLMAdd", "Supplier drafting standard"});
   EXPECT_EQ(sample.code, kExitOk) << sample.err;

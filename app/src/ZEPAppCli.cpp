@@ -212,6 +212,7 @@ public:
     _pRoot = std::make_unique<ZEPDlgWindow>(nullptr, "DraftingOptions", 0);
     for (const ZEPAppFileError& w : _file.LoadWarnings())
       _err << "warning: " << w.Text() << "\n";
+    for (const std::string& w : DisagreeingSettings()) _err << "warning: " << w << "\n";
     if (SUCCEEDED(rc)) return kExitOk;
     // A file that cannot be read at all (a FIFO, a device, too large) is not shown around.
     bool userFaulty = false, unreadable = false;

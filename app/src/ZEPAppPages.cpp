@@ -373,6 +373,27 @@ std::vector<std::string> AppRepositories() {
   return {names.begin(), names.end()};
 }
 
+std::vector<std::string> DisagreeingSettings() {
+  // Lists that run in parallel, entry i of one belonging to entry i of the other.
+  static const struct {
+    const char *page, *first, *second;
+  } kParallel[] = {{"Main", "StandardPLMList", "StandardPLMIDList"}};
+  std::vector<std::string> found;
+  for (const auto& pair : kParallel) {
+    const ZEPAppSetting* first = FindSetting(pair.page, pair.first);
+    const ZEPAppSetting* second = FindSetting(pair.page, pair.second);
+    std::vector<std::string> a, b;
+    for (auto [row, texts] : {std::make_pair(first, &a), std::make_pair(second, &b)})
+      if (const ZEPSysSettingRepository* rep = row ? ZEPSysSettingRepository::GetRepository(row->repository.c_str()) : nullptr)
+        rep->ReadAttr(row->stored.c_str(), *texts);
+    if (first && second && a.size() != b.size())
+      found.push_back(first->stored + " holds " + std::to_string(a.size()) + " names and " + second->stored + " " +
+                      std::to_string(b.size()) + " keys: they go in pairs, so no PLM standard is shown, and adding "
+                      "or removing one replaces both lists");
+  }
+  return found;
+}
+
 void ApplyDefaults() {
   for (const ZEPAppSetting& s : AppSettings()) {
     ZEPSysSettingRepository* rep = ZEPSysSettingRepository::GetRepository(s.repository.c_str(), 0);

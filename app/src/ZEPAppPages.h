@@ -36,6 +36,11 @@ const ZEPAppPage* FindPage(const std::string& iName);
 // The repositories the pages use, each opened once.
 std::vector<std::string> AppRepositories();
 
+// Settings that must agree with each other and do not, as sentences (the main page's PLM
+// names and keys go in pairs: lists of different sizes show no PLM standard at all, and the
+// next change of them replaces both). Call once the files are loaded.
+std::vector<std::string> DisagreeingSettings();
+
 // Puts the application's default of every setting into its repository, unless the
 // administrator's file gave one. Call once the files are loaded.
 void ApplyDefaults();

@@ -5,6 +5,7 @@
 
 #include <nlohmann/json.hpp>
 
+#include <algorithm>
 #include <cstdlib>
 #include <filesystem>
 #include <set>
@@ -90,9 +91,12 @@ bool LoadPLMRepository(const std::string& iPath, std::string& oError) {
     ZEPPLMSetup::Standard standard;
     for (const auto& [member, value] : entry.items()) {
       if (member == "name" || member == "key") {
-        if (!value.is_string() || value.get<std::string>().empty())
+        const std::string text = value.is_string() ? value.get<std::string>() : std::string();
+        const bool control = std::any_of(text.begin(), text.end(),
+                                         [](char c) { return static_cast<unsigned char>(c) < 0x20; });
+        if (text.empty() || control)
           return fault({"standards", at, member}, false,
-                       "\"" + member + "\" must be a text that is not empty");
+                       "\"" + member + "\" must be a text that is not empty, without control characters");
         (member == "name" ? standard.name : standard.key) = value.get<std::string>();
       } else if (member == "unicity") {
         if (!value.is_number_integer() || value.get<long long>() < -1000000 ||
