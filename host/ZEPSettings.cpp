@@ -189,6 +189,12 @@ void ZEPSysSettingRepository::SetUserValue(const std::string& iName, const Value
   else _user[iName] = iValue;
 }
 
+void ZEPSysSettingRepository::SetUserValues(std::map<std::string, Value>&& iValues) {
+  if (_user.empty()) _user.swap(iValues);
+  else
+    for (auto& [name, value] : iValues) _user.insert_or_assign(name, std::move(value));
+}
+
 ZEPSysPreferenceRepository* ZEPSysPreferenceRepository::GetPreferenceRepository(const char* iName) {
   return Lookup<ZEPSysPreferenceRepository>(iName);
 }

@@ -109,6 +109,8 @@ public:
   // Drops the user's value: the attribute reads its default again. 0 when locked.
   int ResetAttr(const std::string& iName);
   void SetUserValue(const std::string& iName, const Value& iValue); // loading, not a change
+  // Loading many at once: taken whole (no copy) when the user's layer is empty, else merged in.
+  void SetUserValues(std::map<std::string, Value>&& iValues);
 
   const std::map<std::string, Value>& UserValues() const { return _user; }
   const std::map<std::string, Value>& Defaults() const { return _defaults; }

@@ -272,6 +272,59 @@ TEST_F(SettingsFileTest, TextsRoundTripLockAndKeepTheirKind) {
   EXPECT_NE(std::string::npos, checked.LastError().find("expected \"double\"")) << checked.LastError();
 }
 
+TEST_F(SettingsFileTest, SavesKeepWhatAnotherProcessWroteSinceTheLoad) {
+  auto stored = [&](const char* iAttr) -> std::optional<int> {
+    ZEPAppSettingsDoc doc;
+    if (!ParseSettingsText(ReadBytes(_user), "", false, doc).empty()) return -1;
+    const auto& entries = doc.settings["R"];
+    auto it = entries.find(iAttr);
+    if (it == entries.end()) return std::nullopt;
+    const auto* ints = std::get_if<std::vector<int>>(&*it->second.value);
+    return ints ? ints->at(0) : -2;
+  };
+  const std::string other = "{\"settings\": {\"R\": {\"A\": {\"int\": 2}, \"C\": {\"int\": 1}, "
+                            "\"E\": {\"int\": 5}, \"W\": {\"double\": 1}}}}";
+  // Loaded from a file, or from none; either way another process writes before each save.
+  for (bool fileAtLoad : {true, false}) {
+    SCOPED_TRACE(fileAtLoad ? "a file at load" : "no file at load");
+    fs::remove(_user);
+    if (fileAtLoad)
+      WriteBytes(_user, "{\"settings\": {\"R\": {\"A\": {\"int\": 1}, \"C\": {\"int\": 1}, "
+                        "\"W\": {\"double\": 1}}}}");
+    ZEPSysSettingRepository::CloseAll();
+    ZEPAppSettingsFile store;
+    std::vector<ZEPAppAttrRule> rules(5);
+    for (std::size_t k = 0; k < rules.size(); ++k)
+      rules[k] = {ZEPAppRepoKind::Setting, "R", std::string(1, "ABCEW"[k]), 1, 1, {}};
+    store.SetRules(rules); // W holds a double where an int is expected: reported, never applied
+    ASSERT_EQ(S_OK, store.Load(_user.string()));
+    ZEPSysSettingRepository* repo = store.OpenSettings("R");
+    WriteBytes(_user, other);
+    const int three = 3, four = 4, six = 6;
+    repo->WriteAttr("B", &three, 1);
+    if (fileAtLoad) store.Reset("R", "C");
+    ASSERT_EQ(S_OK, repo->SaveRepository()) << store.LastError();
+    EXPECT_EQ(2, stored("A")) << "changed by the other process, not by this one";
+    EXPECT_EQ(3, stored("B"));
+    EXPECT_EQ(fileAtLoad ? std::nullopt : std::optional<int>(1), stored("C"));
+    EXPECT_EQ(5, stored("E"));
+    EXPECT_EQ(-2, stored("W")) << "the double left out stays as it was";
+    // Again after this run's own save, and once more after another rewrite.
+    repo->WriteAttr("B", &four, 1);
+    ASSERT_EQ(S_OK, repo->SaveRepository()) << store.LastError();
+    EXPECT_EQ(2, stored("A"));
+    WriteBytes(_user, std::string(ReadBytes(_user)).replace(ReadBytes(_user).find("\"int\": 2"), 8, "\"int\": 7"));
+    repo->WriteAttr("W", &six, 1); // the value left out is replaced once this run sets it ...
+    ASSERT_EQ(S_OK, repo->SaveRepository()) << store.LastError();
+    EXPECT_EQ(7, stored("A"));
+    EXPECT_EQ(4, stored("B"));
+    EXPECT_EQ(6, stored("W"));
+    EXPECT_EQ(S_OK, store.Reset("R", "W")); // ... and then reset like any other
+    EXPECT_EQ(std::nullopt, stored("W"));
+    EXPECT_EQ(7, stored("A"));
+  }
+}
+
 TEST_F(SettingsFileTest, FailedSaveLeavesTheOldFileAndNoTemporaryFile) {
   auto ops = std::make_shared<FaultyOps>();
   ZEPAppSettingsFile store(ops);

@@ -119,6 +119,9 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     std::string path;
     ZEPAppSettingsDoc doc;
     std::string bytes; // what the file holds
+    // Whether doc holds what bytes say. A sound user's file is loaded without a document
+    // (its values go straight to the repositories); Doc() reads one when it is needed.
+    bool parsed = true;
     bool onDisk = false;
     std::optional<ZEPAppFileError> fault; // set when it could not be read: never written then
     std::set<AttrKey> unusable;           // values reported and not applied
@@ -133,10 +136,17 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
   std::map<AttrKey, ZEPAppAttrRule> rules;
   std::set<RepoKey> ruled; // repositories some rule names
   int lockTimeoutMs = kLockTimeoutMs;
-  // The user's values each repository was given from the file, and attributes reset since:
-  // a save writes only what differs from them, over what the file holds then.
+  // The values of the user's file a quick load read, until each repository takes its own.
+  ZEPAppSettingsValues loaded;
+  std::set<RepoKey> handedOut; // repositories of `loaded` whose values have gone to the repository
+  // What each repository was given from the user's file, and attributes reset since: a save
+  // writes only what differs from it, over what the file holds then. That is the usable values
+  // of the user's document, until the document is read again with something another process
+  // wrote: just before, what the repositories were given is copied here (rarely), and the
+  // document no longer tells it.
   std::map<RepoKey, std::map<std::string, ZEPAppValue>> baseline;
   std::map<RepoKey, std::set<std::string>> erased;
+  std::size_t userReads = 0; // how often the user's document was replaced by another reading
 
   long Fail(std::string iWhy) {
     lastError = std::move(iWhy);
@@ -167,14 +177,20 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     return iRule.check ? iRule.check(iValue) : std::string();
   }
 
-  // Checks what a file that parsed holds against the rules and the locks, notes the values not
-  // to apply and answers what it found, in text order.
-  std::vector<ZEPAppFileError> CheckValues(File& ioFile, bool iAdmin) {
+  static const ZEPAppValue* ValueOf(const ZEPAppAttrEntry& iEntry) { return iEntry.value ? &*iEntry.value : nullptr; }
+  static const ZEPAppValue* ValueOf(const ZEPAppValue& iValue) { return &iValue; }
+  static bool LockedIn(const ZEPAppAttrEntry& iEntry) { return iEntry.locked; }
+  static bool LockedIn(const ZEPAppValue&) { return false; }
+
+  // Checks what a file that parsed holds (iDoc: its document, or the values a quick load read)
+  // against the rules and the locks, notes the values not to apply and answers what it found,
+  // in text order.
+  template <class Doc> std::vector<ZEPAppFileError> CheckValues(File& ioFile, bool iAdmin, const Doc& iDoc) {
     ioFile.unusable.clear();
     std::vector<ZEPAppPlacedMessage> found;
     for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference}) {
       const char* section = kind == ZEPAppRepoKind::Setting ? "settings" : "preferences";
-      for (const auto& [repo, entries] : ioFile.doc.Of(kind)) {
+      for (const auto& [repo, entries] : iDoc.Of(kind)) {
         // Looked up once per repository; the messages are built only for what is reported.
         const bool isRuled = ruled.count({kind, repo}) != 0;
         const ZEPAppRepoEntries* admins = nullptr;
@@ -190,19 +206,20 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
             ioFile.unusable.insert({kind, repo, attr});
             continue;
           }
-          if (!entry.value) continue;
-          std::string why = rule == rules.end() ? std::string() : Verdict(rule->second, *entry.value);
+          const ZEPAppValue* value = ValueOf(entry);
+          if (!value) continue;
+          std::string why = rule == rules.end() ? std::string() : Verdict(rule->second, *value);
           const ZEPAppAttrEntry* byAdmin = nullptr;
           if (admins)
             if (auto a = admins->find(attr); a != admins->end()) byAdmin = &a->second;
           if (why.empty() && byAdmin && byAdmin->locked)
             why = "is locked (" + LockText(byAdmin->by) + "); this value is ignored";
           else if (!why.empty())
-            why += iAdmin ? (entry.locked ? "; the lock holds at the application's default" : "; not used")
+            why += iAdmin ? (LockedIn(entry) ? "; the lock holds at the application's default" : "; not used")
                           : (byAdmin && byAdmin->value ? "; the administrator's value is used instead"
                                                        : "; the default is used instead");
           if (why.empty()) continue;
-          found.push_back({JsonPointer({section, repo, attr, kTypeNames[entry.value->index()]}), false,
+          found.push_back({JsonPointer({section, repo, attr, kTypeNames[value->index()]}), false,
                            std::string(section) + "/" + repo + "/" + attr + ": " + why});
           ioFile.unusable.insert({kind, repo, attr});
         }
@@ -217,8 +234,40 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     return placed;
   }
 
+  // The document of a file, read from its bytes the first time it is needed after a quick
+  // load. Those bytes read soundly once; should they not now, the file is treated as faulty
+  // (never written) rather than as empty.
+  ZEPAppSettingsDoc& Doc(File& ioFile) {
+    if (ioFile.parsed) return ioFile.doc;
+    ioFile.parsed = true;
+    std::vector<ZEPAppFileError> faults = ParseSettingsText(ioFile.bytes, ioFile.path, &ioFile == &admin, ioFile.doc);
+    if (!faults.empty() && !ioFile.fault) ioFile.fault = faults.front();
+    return ioFile.doc;
+  }
+
+  // Whether an attribute of the user's document was left out of its repository.
+  bool Unusable(const RepoKey& iRepo, const std::string& iAttr) const {
+    return !user.unusable.empty() && user.unusable.count({iRepo.first, iRepo.second, iAttr}) != 0;
+  }
+
+  // Before the user's document is replaced by what another process wrote: what each
+  // repository was given is kept apart.
+  void KeepBaselines() {
+    for (const RepoKey& key : bound) {
+      if (baseline.count(key)) continue;
+      std::map<std::string, ZEPAppValue>& kept = baseline[key];
+      const auto& repos = Doc(user).Of(key.first);
+      auto it = repos.find(key.second);
+      if (it == repos.end()) continue;
+      for (const auto& [attr, entry] : it->second)
+        if (entry.value && !Unusable(key, attr)) kept.emplace_hint(kept.end(), attr, *entry.value);
+    }
+  }
+
   // Reads and parses one file into ioFile. False with the faults when it could not be read.
-  bool ReadInto(File& ioFile, bool iAdmin, std::vector<ZEPAppFileError>& oFaults) {
+  // oValues (loading the user's file): a sound file's values go there, without a document.
+  bool ReadInto(File& ioFile, bool iAdmin, std::vector<ZEPAppFileError>& oFaults,
+                ZEPAppSettingsValues* oValues = nullptr) {
     try {
       ZEPAppFileError err;
       std::string bytes;
@@ -227,19 +276,29 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
       // The bytes this run read or wrote last, read again (a save under the lock when no one
       // else wrote meanwhile): the content is the same, there is nothing to parse.
       if (read && onDisk && ioFile.onDisk && !ioFile.fault && bytes == ioFile.bytes) return true;
+      if (&ioFile == &user) {
+        KeepBaselines();
+        ++userReads;
+      }
       ioFile.doc = ZEPAppSettingsDoc();
+      ioFile.parsed = true;
       ioFile.bytes = std::move(bytes);
       ioFile.onDisk = onDisk;
       ioFile.fault.reset();
       if (!read) {
         oFaults.push_back(err);
+      } else if (oValues && ReadSettingsValues(ioFile.bytes, *oValues)) {
+        ioFile.parsed = false;
       } else {
+        if (oValues) *oValues = ZEPAppSettingsValues();
         std::vector<ZEPAppFileError> faults = ParseSettingsText(ioFile.bytes, ioFile.path, iAdmin, ioFile.doc);
         oFaults.insert(oFaults.end(), faults.begin(), faults.end());
       }
     } catch (const std::exception& ex) { // out of memory and the like: still a report, not a crash
       ioFile.doc = ZEPAppSettingsDoc();
+      ioFile.parsed = true;
       ioFile.bytes.clear();
+      if (oValues) *oValues = ZEPAppSettingsValues();
       oFaults.push_back(ZEPAppFileError{ioFile.path, 0, 0, std::string("cannot be read: ") + ex.what(), true});
     }
     if (oFaults.empty()) return true;
@@ -253,25 +312,35 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
   void LoadFile(File& ioFile, bool iAdmin) {
     if (ioFile.path.empty()) return;
     std::vector<ZEPAppFileError> faults;
-    const bool read = ReadInto(ioFile, iAdmin, faults);
+    const bool read = ReadInto(ioFile, iAdmin, faults, iAdmin ? nullptr : &loaded);
     loadErrors.insert(loadErrors.end(), faults.begin(), faults.end());
     if (!read && !iAdmin) return;
-    std::vector<ZEPAppFileError> found = CheckValues(ioFile, iAdmin);
+    std::vector<ZEPAppFileError> found;
+    if (ioFile.parsed) {
+      found = CheckValues(ioFile, iAdmin, ioFile.doc);
+    } else {
+      found = CheckValues(ioFile, iAdmin, loaded);
+      for (const auto& [kind, repo, attr] : ioFile.unusable) loaded.Of(kind)[repo].erase(attr);
+    }
     auto& out = iAdmin ? loadErrors : loadWarnings; // the user's file: warnings, the default shows
     out.insert(out.end(), found.begin(), found.end());
   }
 
   // Puts the files' content for one repository into it.
   void Apply(ZEPAppRepoKind iKind, ZEPSysSettingRepository& ioRepo) {
-    std::map<std::string, ZEPAppValue>& applied = baseline[{iKind, ioRepo.GetName()}];
-    applied.clear();
-    const auto& users = user.doc.Of(iKind);
-    if (auto it = users.find(ioRepo.GetName()); it != users.end())
-      for (const auto& [attr, entry] : it->second) // in order: each insertion goes at the end
-        if (entry.value && (user.unusable.empty() || !user.unusable.count({iKind, ioRepo.GetName(), attr}))) {
-          ioRepo.SetUserValue(attr, *entry.value);
-          applied.emplace_hint(applied.end(), attr, *entry.value);
-        }
+    const RepoKey key{iKind, ioRepo.GetName()};
+    baseline.erase(key); // what it is given is the user's document's usable values again
+    auto& staged = loaded.Of(iKind);
+    auto it = staged.find(key.second);
+    if (it != staged.end() && !handedOut.count(key)) { // from a quick load: moved, not copied
+      ioRepo.SetUserValues(std::move(it->second));
+      handedOut.insert(key);
+    } else if (user.parsed || it != staged.end()) { // else the file has nothing for it
+      const auto& users = Doc(user).Of(iKind);
+      if (auto repo = users.find(key.second); repo != users.end())
+        for (const auto& [attr, entry] : repo->second) // in order: each insertion goes at the end
+          if (entry.value && !Unusable(key, attr)) ioRepo.SetUserValue(attr, *entry.value);
+    }
     const auto& admins = admin.doc.Of(iKind);
     if (auto it = admins.find(ioRepo.GetName()); it != admins.end())
       for (const auto& [attr, entry] : it->second) {
@@ -324,7 +393,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
            "); correct or remove it");
       return false;
     }
-    const std::vector<ZEPAppFileError> found = CheckValues(ioFile, iAdmin);
+    const std::vector<ZEPAppFileError> found = CheckValues(ioFile, iAdmin, Doc(ioFile));
     if (iAdmin && !found.empty()) {
       Fail(ioFile.path + " is not changed because it holds a fault (" + found.front().Text() + "); correct it first");
       return false;
@@ -344,13 +413,17 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
                   "); correct or remove it");
     if (!AdminTrusted()) return E_FAIL;
     const RepoKey key{iKind, iRepo.GetName()};
-    std::map<std::string, ZEPAppValue>& before = baseline[key];
-    const std::map<std::string, ZEPAppValue>& now = iRepo.UserValues();
-    std::vector<Change> changes = Changes(before, now, erased[key]);
+    std::vector<Change> changes = ChangesOf(key, iRepo);
+    if (user.fault) return Fail(user.path + " is not saved because it could not be read again (" +
+                                user.fault->Text() + ")");
     if (changes.empty()) return S_OK;
 
     ZEPAppFileLock lock;
+    const std::size_t reads = userReads;
     if (!LockAndReread(user, false, lock)) return E_FAIL;
+    // Another process wrote the file: the document that told what the repository was given has
+    // been replaced (and that kept apart), and the changes pointed into it.
+    if (userReads != reads) changes = ChangesOf(key, iRepo);
     // The changes go into the file's content in place; what they replace is kept to be put
     // back if the file cannot be written.
     auto& repos = user.doc.Of(iKind);
@@ -361,10 +434,10 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     std::vector<std::pair<const std::string*, std::optional<ZEPAppAttrEntry>>> replaced;
     replaced.reserve(changes.size());
     ForEachPlace(entries, changes, [&](ZEPAppRepoEntries::iterator& ioAt, const Change& c) {
-      const bool there = ioAt != entries.end() && ioAt->first == *c.name;
-      replaced.emplace_back(c.name, there ? std::optional<ZEPAppAttrEntry>(std::move(ioAt->second)) : std::nullopt);
+      const bool there = ioAt != entries.end() && ioAt->first == c.name;
+      replaced.emplace_back(&c.name, there ? std::optional<ZEPAppAttrEntry>(std::move(ioAt->second)) : std::nullopt);
       if (c.value) {
-        if (!there) ioAt = entries.emplace_hint(ioAt, *c.name, ZEPAppAttrEntry());
+        if (!there) ioAt = entries.emplace_hint(ioAt, c.name, ZEPAppAttrEntry());
         ioAt->second = ZEPAppAttrEntry{*c.value, false, std::string()};
         ++ioAt;
       } else if (there) ioAt = entries.erase(ioAt);
@@ -379,55 +452,80 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
       if (back.empty() && newRepo) repos.erase(iRepo.GetName());
       return rc;
     }
-    // The baseline becomes what the repository holds, by the same changes.
-    ForEachPlace(before, changes, [&](std::map<std::string, ZEPAppValue>::iterator& ioAt, const Change& c) {
-      const bool there = ioAt != before.end() && ioAt->first == *c.name;
-      if (c.value) {
-        if (there) ioAt->second = *c.value;
-        else ioAt = before.emplace_hint(ioAt, *c.name, *c.value);
-        ++ioAt;
-      } else if (there) ioAt = before.erase(ioAt);
-    });
+    // What the repository was given becomes what it holds: the document says so now, a value
+    // once left out included; a baseline kept apart follows the same changes.
+    if (auto kept = baseline.find(key); kept != baseline.end()) {
+      std::map<std::string, ZEPAppValue>& before = kept->second;
+      ForEachPlace(before, changes, [&](std::map<std::string, ZEPAppValue>::iterator& ioAt, const Change& c) {
+        const bool there = ioAt != before.end() && ioAt->first == c.name;
+        if (c.value) {
+          if (there) ioAt->second = *c.value;
+          else ioAt = before.emplace_hint(ioAt, c.name, *c.value);
+          ++ioAt;
+        } else if (there) ioAt = before.erase(ioAt);
+      });
+    }
+    if (!user.unusable.empty())
+      for (const Change& c : changes) user.unusable.erase({iKind, iRepo.GetName(), c.name});
     erased[key].clear();
     return S_OK;
   }
 
   // One attribute a save changes: its new value, or null to remove it.
   struct Change {
-    const std::string* name;
+    std::string name;
     const ZEPAppValue* value;
   };
 
-  // What differs between what the repository was given and what it holds now, and what was
-  // reset since, in name order. One pass over both (they are ordered alike).
-  static std::vector<Change> Changes(const std::map<std::string, ZEPAppValue>& iBefore,
-                                     const std::map<std::string, ZEPAppValue>& iNow,
+  // What this run changed in a repository since it was given the file's values.
+  std::vector<Change> ChangesOf(const RepoKey& iKey, const ZEPSysSettingRepository& iRepo) {
+    const std::map<std::string, ZEPAppValue>& now = iRepo.UserValues();
+    const std::set<std::string>& reset = erased[iKey];
+    if (auto kept = baseline.find(iKey); kept != baseline.end())
+      return Changes(kept->second, [](const auto& e) { return &e.second; }, now, reset);
+    static const ZEPAppRepoEntries kNothing;
+    const auto& repos = Doc(user).Of(iKey.first);
+    auto repo = repos.find(iKey.second);
+    return Changes(repo == repos.end() ? kNothing : repo->second,
+                   [&](const auto& e) { return e.second.value && !Unusable(iKey, e.first) ? &*e.second.value : nullptr; },
+                   now, reset);
+  }
+
+  // What differs between what the repository was given (the elements of iBefore that iGiven
+  // answers a value for) and what it holds now, and what was reset since, in name order. One
+  // pass over both (they are ordered alike).
+  template <class Before, class Given>
+  static std::vector<Change> Changes(const Before& iBefore, Given iGiven, const std::map<std::string, ZEPAppValue>& iNow,
                                      const std::set<std::string>& iErased) {
     std::vector<Change> changes;
     auto b = iBefore.begin();
     auto n = iNow.begin();
-    while (b != iBefore.end() || n != iNow.end()) {
+    for (;;) {
+      while (b != iBefore.end() && !iGiven(*b)) ++b;
+      if (b == iBefore.end() && n == iNow.end()) break;
       const int order = b == iBefore.end() ? 1 : n == iNow.end() ? -1 : b->first.compare(n->first);
       if (order > 0) { // new since
-        changes.push_back({&n->first, &n->second});
+        changes.push_back({n->first, &n->second});
         ++n;
       } else if (order < 0) { // gone since
-        changes.push_back({&b->first, nullptr});
+        changes.push_back({b->first, nullptr});
         ++b;
       } else {
-        if (!(b->second == n->second)) changes.push_back({&n->first, &n->second});
+        if (!(*iGiven(*b) == n->second)) changes.push_back({n->first, &n->second});
         ++b;
         ++n;
       }
     }
     bool added = false;
-    for (const std::string& attr : iErased)
-      if (!iNow.count(attr) && !iBefore.count(attr)) {
-        changes.push_back({&attr, nullptr});
+    for (const std::string& attr : iErased) {
+      auto given = iBefore.find(attr);
+      if (!iNow.count(attr) && (given == iBefore.end() || !iGiven(*given))) {
+        changes.push_back({attr, nullptr});
         added = true;
       }
+    }
     if (added)
-      std::sort(changes.begin(), changes.end(), [](const Change& x, const Change& y) { return *x.name < *y.name; });
+      std::sort(changes.begin(), changes.end(), [](const Change& x, const Change& y) { return x.name < y.name; });
     return changes;
   }
 
@@ -439,8 +537,8 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     auto at = ioMap.begin();
     for (const Change& c : iChanges) {
       if (walk)
-        while (at != ioMap.end() && at->first < *c.name) ++at;
-      else at = ioMap.lower_bound(*c.name);
+        while (at != ioMap.end() && at->first < c.name) ++at;
+      else at = ioMap.lower_bound(c.name);
       iVisit(at, c);
     }
   }
@@ -506,7 +604,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
 
   // Marks the user's entries of an attribute for removal at the next save.
   void Erase(ZEPAppRepoKind iKind, const std::string& iRepo, const std::string& iAttr) {
-    const auto& repos = user.doc.Of(iKind);
+    const auto& repos = Doc(user).Of(iKind);
     auto it = repos.find(iRepo);
     if (it != repos.end() && it->second.count(iAttr)) erased[{iKind, iRepo}].insert(iAttr);
   }
@@ -515,7 +613,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     ZEPSysSettingRepository* repo = Bind(iKind, iRepo, false);
     std::set<std::string> names;
     for (const auto& [attr, value] : repo->UserValues()) names.insert(attr);
-    const auto& repos = user.doc.Of(iKind);
+    const auto& repos = Doc(user).Of(iKind);
     if (auto it = repos.find(iRepo); it != repos.end())
       for (const auto& [attr, entry] : it->second) names.insert(attr);
     for (const std::string& attr : names) {
@@ -552,8 +650,13 @@ long ZEPAppSettingsFile::Load(const std::string& iUserPath, const std::string& i
   d.loadErrors.clear();
   d.loadWarnings.clear();
   d.erased.clear();
-  d.user = Impl::File{iUserPath, {}, {}, false, std::nullopt, {}};
-  d.admin = Impl::File{iAdminPath, {}, {}, false, std::nullopt, {}};
+  d.baseline.clear();
+  d.loaded = ZEPAppSettingsValues();
+  d.handedOut.clear();
+  d.user = Impl::File();
+  d.user.path = iUserPath;
+  d.admin = Impl::File();
+  d.admin.path = iAdminPath;
   std::error_code ec;
   d.adminWhere = iAdminPath.empty() ? "" : fs::absolute(iAdminPath, ec).lexically_normal().string();
   if (d.adminWhere.empty()) d.adminWhere = iAdminPath;
@@ -562,8 +665,13 @@ long ZEPAppSettingsFile::Load(const std::string& iUserPath, const std::string& i
 
   std::set<Impl::RepoKey> names = d.bound;
   for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference})
-    for (const Impl::File* f : {&d.admin, &d.user})
-      for (const auto& repo : f->doc.Of(kind)) names.emplace(kind, repo.first);
+  {
+    for (const auto& repo : d.admin.doc.Of(kind)) names.emplace(kind, repo.first);
+    if (d.user.parsed)
+      for (const auto& repo : d.user.doc.Of(kind)) names.emplace(kind, repo.first);
+    else
+      for (const auto& repo : d.loaded.Of(kind)) names.emplace(kind, repo.first);
+  }
   for (const auto& [kind, name] : names) d.Bind(kind, name, true);
   if (d.loadErrors.empty()) return S_OK;
   d.lastError = d.loadErrors.front().Text();
@@ -682,7 +790,7 @@ long ZEPAppSettingsFile::ResetAll() {
   Impl& d = *_pImpl;
   std::set<Impl::RepoKey> names = d.bound;
   for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference})
-    for (const auto& repo : d.user.doc.Of(kind)) names.emplace(kind, repo.first);
+    for (const auto& repo : d.Doc(d.user).Of(kind)) names.emplace(kind, repo.first);
   long result = S_OK;
   std::string firstError;
   for (const auto& [kind, name] : names) {

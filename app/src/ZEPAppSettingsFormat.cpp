@@ -9,6 +9,7 @@
 #include <cstdint>
 #include <cstring>
 #include <set>
+#include <string_view>
 #include <utility>
 
 namespace zepapp {
@@ -413,7 +414,8 @@ public:
   QuickReader(const std::string& iText, bool iAdmin)
       : _p(iText.data()), _end(iText.data() + iText.size()), _admin(iAdmin) {}
 
-  bool Document(ZEPAppSettingsDoc& oDoc) {
+  // Into a document, or into the values of a user's file (ZEPAppSettingsValues).
+  template <class Doc> bool Document(Doc& oDoc) {
     if (_end - _p >= 3 && std::memcmp(_p, "\xEF\xBB\xBF", 3) == 0) _p += 3;
     bool format = false, settings = false, preferences = false;
     Space();
@@ -422,15 +424,16 @@ public:
     if (!Take('}')) {
       do {
         Space();
-        if (!String(_key)) return false;
+        std::string_view key;
+        if (!String(key)) return false;
         if (!Colon()) return false;
-        if (_key == "format") {
+        if (key == "format") {
           if (format || !Literal("1")) return false;
           format = true;
-        } else if (_key == "settings") {
+        } else if (key == "settings") {
           if (settings || !Section(oDoc.settings)) return false;
           settings = true;
-        } else if (_key == "preferences") {
+        } else if (key == "preferences") {
           if (preferences || !Section(oDoc.preferences)) return false;
           preferences = true;
         } else return false;
@@ -465,65 +468,81 @@ private:
     _p += n;
     return _p == _end || IsSpace(*_p) || *_p == ',' || *_p == '}' || *_p == ']';
   }
-  // A string without \u escapes, into oText.
-  bool String(std::string& oText) {
+  // A string without \u escapes: a view of the text itself, or of _unescaped when it holds
+  // escapes (valid until the next string).
+  bool String(std::string_view& oText) {
     if (!Take('"')) return false;
-    oText.clear();
-    bool ascii = true;
-    const char* run = _p;
-    for (;;) {
-      if (_p == _end) return false;
+    const char* const start = _p;
+    bool ascii = true, escaped = false;
+    for (; _p != _end && *_p != '"'; ++_p) {
       const unsigned char c = static_cast<unsigned char>(*_p);
-      if (c == '"') break;
       if (c < 0x20) return false;
       if (c >= 0x80) ascii = false;
-      if (c != '\\') {
-        ++_p;
+      if (c == '\\') {
+        escaped = true;
+        if (++_p == _end) return false; // the escaped character is skipped, a quote included
+      }
+    }
+    if (_p == _end) return false;
+    oText = std::string_view(start, static_cast<std::size_t>(_p - start));
+    ++_p;
+    if (!ascii && ZEPFirstBadUtf8(std::string(oText)) != kNone) return false;
+    return !escaped || Unescape(oText);
+  }
+  bool String(std::string& oText) {
+    std::string_view text;
+    if (!String(text)) return false;
+    oText.assign(text.data(), text.size());
+    return true;
+  }
+  // The escapes of ioText decoded into _unescaped, which ioText then views.
+  bool Unescape(std::string_view& ioText) {
+    _unescaped.clear();
+    for (std::size_t i = 0; i < ioText.size(); ++i) {
+      if (ioText[i] != '\\') {
+        _unescaped += ioText[i];
         continue;
       }
-      oText.append(run, _p);
-      if (++_p == _end) return false;
-      switch (*_p) {
-      case '"': oText += '"'; break;
-      case '\\': oText += '\\'; break;
-      case '/': oText += '/'; break;
-      case 'b': oText += '\b'; break;
-      case 'f': oText += '\f'; break;
-      case 'n': oText += '\n'; break;
-      case 'r': oText += '\r'; break;
-      case 't': oText += '\t'; break;
+      switch (ioText[++i]) {
+      case '"': _unescaped += '"'; break;
+      case '\\': _unescaped += '\\'; break;
+      case '/': _unescaped += '/'; break;
+      case 'b': _unescaped += '\b'; break;
+      case 'f': _unescaped += '\f'; break;
+      case 'n': _unescaped += '\n'; break;
+      case 'r': _unescaped += '\r'; break;
+      case 't': _unescaped += '\t'; break;
       default: return false;
       }
-      run = ++_p;
     }
-    oText.append(run, _p);
-    ++_p;
-    return ascii || ZEPFirstBadUtf8(oText) == kNone;
+    ioText = _unescaped;
+    return true;
   }
 
   // Inserts iKey into a map whose keys usually come in order (as saved); false when it is there.
-  template <class Map> typename Map::mapped_type* Insert(Map& ioMap, const std::string& iKey) {
+  template <class Map> typename Map::mapped_type* Insert(Map& ioMap, std::string_view iKey) {
     if (ioMap.empty() || ioMap.rbegin()->first < iKey)
       return &ioMap.emplace_hint(ioMap.end(), iKey, typename Map::mapped_type())->second;
     auto [it, inserted] = ioMap.emplace(iKey, typename Map::mapped_type());
     return inserted ? &it->second : nullptr;
   }
 
-  bool Section(std::map<std::string, ZEPAppRepoEntries>& oRepos) {
+  template <class Repo> bool Section(std::map<std::string, Repo>& oRepos) {
     if (!Take('{')) return false;
     Space();
     if (Take('}')) return true;
     do {
       Space();
-      if (!String(_key) || _key.empty() || !Colon()) return false;
-      ZEPAppRepoEntries* entries = Insert(oRepos, _key);
+      std::string_view key;
+      if (!String(key) || key.empty() || !Colon()) return false;
+      Repo* entries = Insert(oRepos, key);
       if (!entries || !Take('{')) return false;
       Space();
       if (Take('}')) continue;
       do {
         Space();
-        if (!String(_key) || _key.empty() || !Colon()) return false;
-        ZEPAppAttrEntry* entry = Insert(*entries, _key);
+        if (!String(key) || key.empty() || !Colon()) return false;
+        auto* entry = Insert(*entries, key);
         if (!entry || !Entry(*entry)) return false;
         Space();
       } while (Take(','));
@@ -533,6 +552,13 @@ private:
     return Take('}');
   }
 
+  // A value alone: an entry without lock.
+  bool Entry(ZEPAppValue& oValue) {
+    ZEPAppAttrEntry entry;
+    if (!Entry(entry) || !entry.value || entry.locked) return false;
+    oValue = std::move(*entry.value);
+    return true;
+  }
   bool Entry(ZEPAppAttrEntry& oEntry) {
     if (!Take('{')) return false;
     bool locked = false, by = false;
@@ -540,19 +566,20 @@ private:
     if (!Take('}')) {
       do {
         Space();
-        if (!String(_field) || !Colon()) return false;
-        if (_field == "double" || _field == "int" || _field == "unsigned" || _field == "text") {
+        std::string_view field;
+        if (!String(field) || !Colon()) return false;
+        if (field == "double" || field == "int" || field == "unsigned" || field == "text") {
           if (oEntry.value) return false;
-          const bool ok = _field[0] == 'd'   ? Values<double>(oEntry)
-                          : _field[0] == 'i' ? Values<int>(oEntry)
-                          : _field[0] == 'u' ? Values<unsigned int>(oEntry)
+          const bool ok = field[0] == 'd'   ? Values<double>(oEntry)
+                          : field[0] == 'i' ? Values<int>(oEntry)
+                          : field[0] == 'u' ? Values<unsigned int>(oEntry)
                                              : Values<std::string>(oEntry);
           if (!ok) return false;
-        } else if (_field == "locked" && _admin && !locked) {
+        } else if (field == "locked" && _admin && !locked) {
           locked = true;
           if (Literal("true")) oEntry.locked = true;
           else if (!Literal("false")) return false;
-        } else if (_field == "by" && _admin && !by) {
+        } else if (field == "by" && _admin && !by) {
           by = true;
           if (!String(oEntry.by)) return false;
         } else return false;
@@ -643,7 +670,7 @@ private:
   const char* _p;
   const char* const _end;
   const bool _admin;
-  std::string _key, _field;
+  std::string _unescaped;
 };
 } // namespace
 
@@ -654,6 +681,13 @@ std::vector<ZEPAppFileError> ParseSettingsText(const std::string& iText, const s
   if (start == iText.size()) return {}; // a blank file is an empty one
   if (QuickReader(iText, iAdmin).Document(oDoc)) return {};
   return ParseSettingsTextThoroughly(iText, iPath, iAdmin, oDoc);
+}
+
+bool ReadSettingsValues(const std::string& iText, ZEPAppSettingsValues& oValues) {
+  oValues = ZEPAppSettingsValues();
+  const std::size_t start = SkipSpace(iText, BomLength(iText));
+  if (start == iText.size()) return true; // a blank file is an empty one
+  return QuickReader(iText, false).Document(oValues);
 }
 
 std::vector<ZEPAppFileError> ParseSettingsTextThoroughly(const std::string& iText, const std::string& iPath,

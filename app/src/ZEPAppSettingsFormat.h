@@ -89,6 +89,26 @@ std::vector<ZEPAppFileError> ParseSettingsText(const std::string& iText, const s
 std::vector<ZEPAppFileError> ParseSettingsTextThoroughly(const std::string& iText, const std::string& iPath,
                                                          bool iAdmin, ZEPAppSettingsDoc& oDoc);
 
+// The values of a user's file (which holds no locks), repositories by name: what loading it
+// gives the repositories.
+using ZEPAppRepoValues = std::map<std::string, ZEPAppValue>;
+struct ZEPAppSettingsValues {
+  std::map<std::string, ZEPAppRepoValues> settings;
+  std::map<std::string, ZEPAppRepoValues> preferences;
+  std::map<std::string, ZEPAppRepoValues>& Of(ZEPAppRepoKind iKind) {
+    return iKind == ZEPAppRepoKind::Setting ? settings : preferences;
+  }
+  const std::map<std::string, ZEPAppRepoValues>& Of(ZEPAppRepoKind iKind) const {
+    return iKind == ZEPAppRepoKind::Setting ? settings : preferences;
+  }
+};
+
+// Reads the values of a user's file in one pass, without a document. True when iText is a
+// sound user's file (ParseSettingsText would report nothing and read the same values); false
+// when it holds something to report or a rare form left to ParseSettingsText, which then
+// tells. oValues is complete only on true.
+bool ReadSettingsValues(const std::string& iText, ZEPAppSettingsValues& oValues);
+
 // Writes iDoc in the form above. False with oError when something cannot be written faithfully
 // (a NaN or infinity, a name or text that is not UTF-8, a text holding a NUL); iAdmin keeps
 // locks, else they are left out.
