@@ -879,7 +879,12 @@ TEST_F(AppCli, ScaleRatiosPerRangeAndTheTitleBlockFolder) {
     EXPECT_EQ(result.code, kExitBadValue) << r.args[0];
     EXPECT_NE(result.err.find(r.told), std::string::npos) << r.args[0] << ": " << result.err;
   }
-  EXPECT_EQ(Run({"set", "main", "edtScaleRatioDec", "3"}).code, kExitRefused); // it only shows the ratio
+  Result decimal = Run({"set", "main", "edtScaleRatioDec", "3"});
+  EXPECT_EQ(decimal.code, kExitRefused);
+  EXPECT_NE(decimal.err.find("set edtScaleRatio instead"), std::string::npos) << decimal.err;
+  Result shareable = Run({"set", "main", "chkMakeDrawingShareable", "on"});
+  EXPECT_EQ(shareable.code, kExitRefused);
+  EXPECT_NE(shareable.err.find("turn \"Insert the drawing\" (chkInsertDrawing) on first"), std::string::npos);
 
   // The folder: a text kept as typed; a folder this computer lacks is only warned about.
   const std::string folder = (_dir / "Cartouches \xC3\xA9t\xC3\xA9").string();

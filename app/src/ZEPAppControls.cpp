@@ -175,6 +175,7 @@ const Dependency kDependencies[] = {
     ZEP_APP_STATE_DEPENDENCY(CalloutLastUpdateFailed) ZEP_APP_STATE_DEPENDENCY(IsolatedCallout)
     ZEP_APP_STATE_DEPENDENCY(NotPerpendicularCallout) ZEP_APP_STATE_DEPENDENCY(DrwWeldNotUpToDate)
 #undef ZEP_APP_STATE_DEPENDENCY
+    {"chkMakeDrawingShareable", "chkInsertDrawing", true, false},
     {"chkGVSParamOverride", "chkPreventGVS", false, false},
     {"chkPrevViewGeomUpgrade", "chkPreventViewUpgrade", false, false},
     {"frmViewNameUnicityScope", "checkViewNamesUnicity", true, false},
@@ -609,6 +610,8 @@ std::string WhyRefused(const std::vector<ZEPAppControl>& iControls, const ZEPApp
     return title + " is disabled while " + Quoted(choice->Title()) + " is " + Quoted(shown) +
            "; choose " + wanted + " (" + choice->name + ") first";
   }
+  if (iControl.name == std::string(kRatioEditor) + "Dec")
+    return title + " only shows the scale ratio as a decimal number; set " + kRatioEditor + " instead";
   if (iControl.name == kRemovePLMStandard)
     return title + " is enabled while a PLM standard is current; set it to a listed PLM standard, which it makes "
                    "current first";
