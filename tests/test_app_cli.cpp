@@ -956,6 +956,12 @@ TEST_F(AppCli, StandardsFolderAndAFaultyPLMRepository) {
                                                "DrwStandardPLMIDList": {"text": "k"}}}})";
   EXPECT_NE(Run({"get", "main", "cmbStandardName"}).err.find("holds 2 names and DrwStandardPLMIDList 1 keys"),
             std::string::npos);
+  // The standard's name is one text, not a list.
+  std::ofstream(_settings, std::ios::trunc)
+      << R"({"settings": {"DraftingOptions": {"DrwStandardName": {"text": ["JIS", "ANSI"]}}}})";
+  Result two = Run({"get", "main", "cmbStandardName"});
+  EXPECT_EQ(two.out, "ISO\n");
+  EXPECT_NE(two.err.find("holds 2 values, expected 1"), std::string::npos) << two.err;
   fs::remove(_settings);
   // The shipped sample is found like the catalogs, and lists the standards the chooser offers.
   Result sample = Run({"set", "main", "pusStandardPLMAdd", "Supplier drafting standard"});
