@@ -521,10 +521,9 @@ private:
 
   // Inserts iKey into a map whose keys usually come in order (as saved); false when it is there.
   template <class Map> typename Map::mapped_type* Insert(Map& ioMap, std::string_view iKey) {
-    if (ioMap.empty() || ioMap.rbegin()->first < iKey)
-      return &ioMap.emplace_hint(ioMap.end(), iKey, typename Map::mapped_type())->second;
-    auto [it, inserted] = ioMap.emplace(iKey, typename Map::mapped_type());
-    return inserted ? &it->second : nullptr;
+    const std::size_t before = ioMap.size();
+    auto it = ioMap.emplace_hint(ioMap.end(), iKey, typename Map::mapped_type()); // in order: no search
+    return ioMap.size() > before ? &it->second : nullptr;
   }
 
   template <class Repo> bool Section(std::map<std::string, Repo>& oRepos) {
@@ -552,16 +551,11 @@ private:
     return Take('}');
   }
 
-  // A value alone: an entry without lock.
-  bool Entry(ZEPAppValue& oValue) {
-    ZEPAppAttrEntry entry;
-    if (!Entry(entry) || !entry.value || entry.locked) return false;
-    oValue = std::move(*entry.value);
-    return true;
-  }
-  bool Entry(ZEPAppAttrEntry& oEntry) {
+  // An attribute: into a document's entry, or into the value alone (a user's file, where an
+  // entry holds nothing else).
+  template <class Out> bool Entry(Out& oEntry) {
     if (!Take('{')) return false;
-    bool locked = false, by = false;
+    bool value = false, locked = false, by = false;
     Space();
     if (!Take('}')) {
       do {
@@ -569,28 +563,42 @@ private:
         std::string_view field;
         if (!String(field) || !Colon()) return false;
         if (field == "double" || field == "int" || field == "unsigned" || field == "text") {
-          if (oEntry.value) return false;
-          const bool ok = field[0] == 'd'   ? Values<double>(oEntry)
-                          : field[0] == 'i' ? Values<int>(oEntry)
-                          : field[0] == 'u' ? Values<unsigned int>(oEntry)
-                                             : Values<std::string>(oEntry);
+          if (value) return false;
+          value = true;
+          ZEPAppValue& slot = Slot(oEntry);
+          const bool ok = field[0] == 'd'   ? Values<double>(slot)
+                          : field[0] == 'i' ? Values<int>(slot)
+                          : field[0] == 'u' ? Values<unsigned int>(slot)
+                                            : Values<std::string>(slot);
           if (!ok) return false;
-        } else if (field == "locked" && _admin && !locked) {
-          locked = true;
-          if (Literal("true")) oEntry.locked = true;
-          else if (!Literal("false")) return false;
-        } else if (field == "by" && _admin && !by) {
-          by = true;
-          if (!String(oEntry.by)) return false;
-        } else return false;
+        } else if (!_admin || !Lock(oEntry, field, locked, by)) {
+          return false;
+        }
         Space();
       } while (Take(','));
       if (!Take('}')) return false;
     }
-    return oEntry.value || oEntry.locked;
+    return value || locked;
   }
+  static ZEPAppValue& Slot(ZEPAppAttrEntry& ioEntry) { return ioEntry.value.emplace(); }
+  static ZEPAppValue& Slot(ZEPAppValue& ioValue) { return ioValue; }
+  // "locked" or "by" of the administrator's file, each once.
+  bool Lock(ZEPAppAttrEntry& oEntry, std::string_view iField, bool& ioLocked, bool& ioBy) {
+    if (iField == "locked" && !ioLocked) {
+      ioLocked = true;
+      if (Literal("true")) oEntry.locked = true;
+      else if (!Literal("false")) return false;
+      return true;
+    }
+    if (iField == "by" && !ioBy) {
+      ioBy = true;
+      return String(oEntry.by);
+    }
+    return false;
+  }
+  bool Lock(ZEPAppValue&, std::string_view, bool&, bool&) { return false; }
 
-  template <class T> bool Values(ZEPAppAttrEntry& oEntry) {
+  template <class T> bool Values(ZEPAppValue& oValue) {
     std::vector<T> values;
     T v{};
     if (Take('[')) {
@@ -609,7 +617,7 @@ private:
       if (!Item(v)) return false;
       values.push_back(v);
     }
-    oEntry.value = std::move(values);
+    oValue.emplace<std::vector<T>>(std::move(values));
     return true;
   }
   // One value of a list: a number, or a text (String refuses \u escapes, so no NUL gets in).
