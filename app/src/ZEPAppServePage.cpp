@@ -8,10 +8,10 @@ const char* const kLiveStyle = R"CSS(
 [data-control]{cursor:pointer}
 [data-control]:focus-visible{outline:2px solid #3f6fb0;outline-offset:1px}
 .push.disabled{pointer-events:auto}
-.buttons{display:none}
+.dialog>.buttons{display:none}
 .live-status{margin:0 0 8px;padding:4px 8px;border-radius:3px;font-size:12px;color:#3d4752;background:#e2e7ee}
 .live-status.error{background:#fde2e0;color:#8a1c12;font-weight:600}
-.live-bubble{position:absolute;z-index:40;max-width:380px;padding:4px 8px;border-radius:4px;font-size:12px;line-height:1.3;white-space:pre-line;box-shadow:0 2px 8px rgba(0,0,0,.25)}
+.live-bubble{position:absolute;z-index:40;pointer-events:none;max-width:380px;padding:4px 8px;border-radius:4px;font-size:12px;line-height:1.3;white-space:pre-line;box-shadow:0 2px 8px rgba(0,0,0,.25)}
 .live-bubble.refused{background:#fde2e0;color:#8a1c12;border:1px solid #d9857b}
 .live-bubble.note{background:#e6f2e6;color:#1f4d1f;border:1px solid #8fbf8f}
 .live-menu{position:absolute;z-index:50;min-width:140px;max-height:50vh;overflow:auto;background:#fff;border:1px solid #7a8390;border-radius:3px;box-shadow:0 4px 14px rgba(0,0,0,.3)}
@@ -90,6 +90,10 @@ const char* const kLiveScript = R"JS(
         if (c) el.setAttribute('aria-disabled', c.enabled ? 'false' : 'true');
       }
     }
+    // A sub-dialog is open while its id is the address's fragment; the element drawn anew
+    // becomes the fragment's target only when the address is visited again.
+    const open = location.hash.length > 1 && document.getElementById(decodeURIComponent(location.hash.slice(1)));
+    if (open && !open.matches(':target')) location.replace(location.hash);
     if (state.errors.length) say(state.errors.join('\n') + ' \u2014 no change is accepted until this is corrected.', true);
     else if (state.adminFault) say('The administrator\u2019s settings cannot be read, so no change is accepted: ' + state.adminFault, true);
     else say('Changes are saved at once' + (state.settings ? ' to ' + state.settings : '') +
