@@ -121,6 +121,21 @@ def main():
             By.CSS_SELECTOR, '#page-grid [data-name="checkGridLock"]').get_attribute("class").split())
         print("changes made elsewhere shown")
 
+        # A group of radio buttons: the first choice, which disables a control that needs another.
+        driver.find_element(By.CSS_SELECTOR, 'label[for="tab-administration"]').click()
+        group = control(driver, "administration", "frmSelectionOnCurrentAssembly")
+        first = group.find_elements(By.CSS_SELECTOR, ".radio")[0]
+        chosen = first.text
+        first.click()
+        until(driver, "the first choice on", lambda: "on" in control(driver, "administration", "frmSelectionOnCurrentAssembly")
+              .find_elements(By.CSS_SELECTOR, ".radio")[0].get_attribute("class").split())
+        until(driver, "its dependent control disabled",
+              lambda: "disabled" in classes(driver, "administration", "chkShowWarningSelectionOutAssembly"))
+        shown = subprocess.run([BINARY, "--settings", SETTINGS, "--admin", ADMIN, "get", "administration",
+                                "frmSelectionOnCurrentAssembly"], check=True, capture_output=True, text=True)
+        assert shown.stdout.strip() == chosen, (shown.stdout, chosen)
+        print("radio buttons: chosen, saved, dependent control disabled")
+
         # A sub-dialog opened from its push button; its controls work the same way.
         driver.find_element(By.CSS_SELECTOR, 'label[for="tab-geometry"]').click()
         control(driver, "geometry", "cstTypesPushButton").click()
