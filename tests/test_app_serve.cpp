@@ -271,6 +271,12 @@ TEST_F(SettingsFolderTest, ServeCommandPrintsItsAddressAndStopsOnSigterm) {
                                   R"({"page":"grid","control":"checkSnap","value":"off"})", "application/json");
   ASSERT_TRUE(r);
   EXPECT_EQ(r->status, 200);
+  // Its port is its own: a second server cannot take it over, nor share it.
+  const std::string second = "timeout 5 " + std::string(ZEP_APP_BINARY) + " serve --no-open --port " +
+                             std::to_string(port) + " --settings '" + _user.string() + "' --admin '" +
+                             _admin.string() + "' >/dev/null 2>&1";
+  const int secondStatus = std::system(second.c_str());
+  EXPECT_EQ(WIFEXITED(secondStatus) ? WEXITSTATUS(secondStatus) : -1, 1);
   kill(pid, SIGTERM);
   int status = 0;
   ASSERT_EQ(waitpid(pid, &status, 0), pid);

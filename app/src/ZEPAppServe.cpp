@@ -14,7 +14,6 @@
 #include <cstdio>
 #include <cstring>
 #include <filesystem>
-#include <fstream>
 #include <mutex>
 #include <random>
 #include <thread>
@@ -314,6 +313,12 @@ struct ZEPAppServer::Impl {
 
   void Routes() {
     http.set_payload_max_length(kServeMaxBody);
+    // The library's own socket options add SO_REUSEPORT, with which a second program of the
+    // same user binds the very port this one listens on and takes part of its requests.
+    http.set_socket_options([](socket_t iSocket) {
+      const int yes = 1;
+      setsockopt(iSocket, SOL_SOCKET, SO_REUSEADDR, &yes, sizeof yes);
+    });
     // An idle connection the browser keeps open holds a thread until this runs out, and the
     // server's end waits for every thread: one second, still more than the page's polling.
     http.set_keep_alive_timeout(1);
@@ -445,13 +450,14 @@ pid_t OpenInBrowser(const std::string& iUrl, std::string& oFolder) {
   if (!mkdtemp(pattern.data())) return -1;
   oFolder = pattern;
   const std::string file = oFolder + "/open.html";
-  {
-    std::ofstream out(file);
-    const std::string url = EscapeHtml(iUrl);
-    out << "<!DOCTYPE html><meta charset=\"utf-8\"><meta http-equiv=\"refresh\" content=\"0;url=" << url
-        << "\"><title>Drafting options</title><a href=\"" << url << "\">Drafting options</a>\n";
-    if (!out) return -1;
-  }
+  const std::string url = EscapeHtml(iUrl);
+  const std::string page = "<!DOCTYPE html><meta charset=\"utf-8\"><meta http-equiv=\"refresh\" content=\"0;url=" +
+                           url + "\"><title>Drafting options</title><a href=\"" + url + "\">Drafting options</a>\n";
+  const int fd = open(file.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0600);
+  if (fd < 0) return -1;
+  const bool written = write(fd, page.data(), page.size()) == static_cast<ssize_t>(page.size());
+  close(fd);
+  if (!written) return -1;
   posix_spawn_file_actions_t actions;
   posix_spawn_file_actions_init(&actions);
   posix_spawn_file_actions_addopen(&actions, STDIN_FILENO, "/dev/null", O_RDONLY, 0);
