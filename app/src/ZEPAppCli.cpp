@@ -115,6 +115,7 @@ std::string StoredText(const ZEPAppSetting& iSetting) {
 
 } // namespace
 
+// One control as the JSON of show, get and list.
 nlohmann::json ControlJson(const ZEPAppPage& iPage, const std::vector<ZEPAppControl>& iControls,
                            const ZEPAppControl& iControl) {
   const ZEPAppSetting* setting = SettingOf(iPage, iControl.name);
