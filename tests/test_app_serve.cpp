@@ -190,6 +190,13 @@ TEST_F(ServeTest, SubDialogControlsAreSetAsOnTheirPage) {
   const nlohmann::json refused = Change("geometry", "dragOptionPushButton", "open");
   EXPECT_EQ(refused["code"], kExitRefused);
   EXPECT_NE(refused["message"].get<std::string>().find("checkGeomDrag"), std::string::npos) << refused["message"];
+  // A dialog of the newer framework: opened, said, and closed again with its session.
+  for (const char* button : {"pushLegendTableLayout", "pushTableSortCustomLists"}) {
+    const nlohmann::json opened = Change("annotation", button, "open");
+    EXPECT_NE(opened["message"].get<std::string>().find("the dialog opened"), std::string::npos) << opened["message"];
+  }
+  EXPECT_TRUE(ZEPVidFraWindow::Windows().empty()); // the server is idle between requests
+
   const nlohmann::json hidden =
       Post("/api/change", R"({"page":"geometry","control":"checkDragWithEndPts","value":"off"})", 400);
   EXPECT_NE(hidden.value("error", "").find("unknown control"), std::string::npos); // its dialog is not open
