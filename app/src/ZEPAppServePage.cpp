@@ -112,13 +112,13 @@ const char* const kLiveScript = R"JS(
     bubble = null;
   }
   function container(el) { return el.closest('.subbox') || el.closest('.panels') || document.body; }
-  function floatBeside(node, el) {
+  function floatBeside(node, el, below) {
     const box = container(el);
     if (getComputedStyle(box).position === 'static') box.style.position = 'relative';
     box.appendChild(node);
     const r = el.getBoundingClientRect(), b = box.getBoundingClientRect();
     let left = r.right - b.left + box.scrollLeft + 8, top = r.top - b.top + box.scrollTop;
-    if (left + node.offsetWidth > box.scrollLeft + box.clientWidth) { // no room on the right: below
+    if (below || left + node.offsetWidth > box.scrollLeft + box.clientWidth) { // a drop-down, or no room on the right
       left = Math.max(0, r.left - b.left + box.scrollLeft);
       top = r.bottom - b.top + box.scrollTop + 3;
     }
@@ -181,12 +181,15 @@ const char* const kLiveScript = R"JS(
       const pick = document.createElement('input');
       pick.type = 'color';
       pick.title = 'Another colour';
+      const rgb = /(\d+)\D+(\d+)\D+(\d+)/.exec(control.shown); // "RGB 67,102,85"
+      if (rgb) pick.value = '#' + rgb.slice(1).map(function (v) { return ('0' + Number(v).toString(16)).slice(-2); }).join('');
+      else if (/^#[0-9a-f]{6}$/i.test(control.shown)) pick.value = control.shown;
       pick.addEventListener('click', function (ev) { ev.stopPropagation(); });
       pick.addEventListener('change', function () { const v = pick.value; closeMenu(); send(page, control, v); });
       menu.appendChild(pick);
     }
     held = 'menu';
-    floatBeside(menu, el);
+    floatBeside(menu, el, true);
   }
 
   // Typing a value in place, as in a spinner's field; Enter or leaving the field sends it.
