@@ -262,6 +262,16 @@ TEST_F(SettingsFolderTest, ServeCommandPrintsItsAddressAndStopsOnSigterm) {
     _exit(127);
   }
   close(out[1]);
+  // A failed assertion must not leave the server running.
+  struct Reaper {
+    pid_t pid;
+    ~Reaper() {
+      if (pid > 0 && waitpid(pid, nullptr, WNOHANG) == 0) {
+        kill(pid, SIGKILL);
+        waitpid(pid, nullptr, 0);
+      }
+    }
+  } reaper{pid};
   std::string printed;
   char buffer[256];
   while (printed.find("Ctrl+C") == std::string::npos) {
@@ -287,6 +297,7 @@ TEST_F(SettingsFolderTest, ServeCommandPrintsItsAddressAndStopsOnSigterm) {
   kill(pid, SIGTERM);
   int status = 0;
   ASSERT_EQ(waitpid(pid, &status, 0), pid);
+  reaper.pid = 0;
   EXPECT_TRUE(WIFEXITED(status));
   EXPECT_EQ(WEXITSTATUS(status), 0);
   while (true) {
