@@ -4,6 +4,7 @@
 #include "ZEPAppKeys.h"
 #include "ZEPAppPages.h"
 #include "ZEPAppRender.h"
+#include "ZEPAppServe.h"
 #include "ZEPAppSettingsFile.h"
 #include "ZEPAppSettingsRules.h"
 #include "ZEPAppSketcher.h"
@@ -52,6 +53,8 @@ struct Request {
   bool hasValue = false;
   int range = 0; // 0: the range the grid page opens on
   bool all = false, json = false, raw = false, remove = false;
+  int port = 0;       // serve: 0 for a free port
+  bool noOpen = false; // serve: do not ask the desktop to open the page
 };
 
 // Takes the setting named at the start of the request's arguments (PAGE CONTROL, PAGE.CONTROL
@@ -161,10 +164,10 @@ const ZEPAppSetting* RowOf(const ZEPAppPage& iPage, const std::string& iControl,
   return SettingOf(iPage, iControl);
 }
 
-// One control as the JSON of show, get and list; iSetting: which of the control's settings
-// (its first when null).
+} // namespace
+
 nlohmann::json ControlJson(const ZEPAppPage& iPage, const std::vector<ZEPAppControl>& iControls,
-                           const ZEPAppControl& iControl, const ZEPAppSetting* iSetting = nullptr) {
+                           const ZEPAppControl& iControl, const ZEPAppSetting* iSetting) {
   const ZEPAppSetting* setting = iSetting ? iSetting : SettingOf(iPage, iControl.name);
   nlohmann::json j = {{"page", iPage.name},
                       {"control", iControl.name},
@@ -186,6 +189,57 @@ nlohmann::json ControlJson(const ZEPAppPage& iPage, const std::vector<ZEPAppCont
   return j;
 }
 
+bool PrepareChooser(const ZEPAppControl& iControl, const std::string& iPLMRepository, ZEPAppOutcome& oOutcome) {
+  if (iControl.name != "pusStandardPLMAdd") return true;
+  std::string error;
+  if (LoadPLMRepository(iPLMRepository, error)) return true;
+  oOutcome.code = kExitFile;
+  oOutcome.message = "the PLM repository cannot be used: " + error + "\nnothing was changed";
+  return false;
+}
+
+long LoadSettingsFiles(ZEPAppSettingsFile& ioFile, const ZEPAppSettingsPaths& iPaths) {
+  ioFile.SetRules(AppSettingRules());
+  const long rc = ioFile.Load(iPaths.user, iPaths.admin);
+  for (const std::string& name : AppRepositories())
+    ioFile.OpenSettings(name);
+  ioFile.OpenPreferences("DraftingOptions"); // where dialogs keep their places
+  ApplyDefaults();
+  return rc;
+}
+
+ZEPAppOutcome ChangeSetting(ZEPAppSettingsFile& ioFile, const std::vector<ZEPAppControl>& iControls,
+                            const ZEPAppControl& iControl, const std::string& iValue,
+                            const std::string& iPLMRepository) {
+  ZEPAppOutcome outcome;
+  if (!PrepareChooser(iControl, iPLMRepository, outcome)) return outcome;
+  outcome = OperateControl(iControls, iControl, iValue);
+  CloseSubDialog(iControl); // as the user closes the dialog the change was made in
+  if (outcome.code == kExitOk && outcome.changed && FAILED(ioFile.SaveAll())) {
+    outcome.code = kExitFile;
+    outcome.message = "the change was not saved: " + ioFile.LastError();
+  }
+  return outcome;
+}
+
+ZEPAppRenderPage RenderedPage(const ZEPAppPage& iPage, ZEPDlgFrame* iFrame,
+                              const std::vector<ZEPAppControl>& iControls) {
+  ZEPAppRenderPage shown;
+  shown.name = iPage.name;
+  shown.title = iPage.title;
+  shown.frame = iFrame;
+  if (int range = ShownRange(iControls))
+    shown.note = std::string(iPage.name == "main" ? "Scale ratio" : "Spacing and graduations") + " of the " +
+                 ScaleName(range) + " scale range";
+  for (const ZEPAppControl& c : iControls)
+    if (c.opener && (shown.dialogs.empty() || shown.dialogs.back().dialog != c.subDialog))
+      shown.dialogs.push_back({c.opener, c.subDialog});
+  for (const ZEPAppControl& c : iControls) shown.whyNot[c.inner] = WhyRefused(iControls, c);
+  return shown;
+}
+
+namespace {
+
 // One run of the application: the settings files, the repositories bound to them and the
 // pages opened on a top-level window.
 class Session {
@@ -200,12 +254,7 @@ public:
   // command that writes stops there (a faulty administrator's file stops every write).
   int Start(const Request& iRequest, bool iWrites) {
     _paths = ResolveSettingsPaths(iRequest.settings, iRequest.admin);
-    _file.SetRules(AppSettingRules());
-    const long rc = _file.Load(_paths.user, _paths.admin);
-    for (const std::string& name : AppRepositories())
-      _file.OpenSettings(name);
-    _file.OpenPreferences("DraftingOptions"); // where dialogs keep their places
-    ApplyDefaults();
+    const long rc = LoadSettingsFiles(_file, _paths);
     _plmPath = ResolvePLMRepository(iRequest.plm);
     if (const std::string why = UseStandardsFolder(ResolveStandardsFolder(iRequest.standards)); !why.empty())
       _err << "warning: " << why << "\n";
@@ -347,12 +396,12 @@ public:
   // Reads the PLM repository for the chooser, before a control that opens it is operated; a
   // non-zero exit code after saying why the file cannot be used.
   int PrepareChooser(const ZEPAppControl& iControl) {
-    if (iControl.name != "pusStandardPLMAdd") return kExitOk;
-    std::string error;
-    if (LoadPLMRepository(_plmPath, error)) return kExitOk;
-    _err << "error: the PLM repository cannot be used: " << error << "\nnothing was changed\n";
-    return kExitFile;
+    ZEPAppOutcome outcome;
+    if (zepapp::PrepareChooser(iControl, _plmPath, outcome)) return kExitOk;
+    _err << "error: " << outcome.message << "\n";
+    return outcome.code;
   }
+  const std::string& PLMRepository() const { return _plmPath; }
 
 private:
   std::string _plmPath;
@@ -479,19 +528,13 @@ int Set(const Request& iRequest, std::ostream& out, std::ostream& err) {
   std::vector<ZEPAppControl> controls;
   const ZEPAppControl* control = nullptr;
   if (int rc = session.Target(iRequest, true, page, controls, &control)) return rc;
-  if (int rc = session.PrepareChooser(*control)) return rc;
-  const ZEPAppOutcome outcome = OperateControl(controls, *control, iRequest.value);
   const int range = ShownRange(controls);
-  CloseSubDialog(*control); // as the user closes the dialog the change was made in
+  const ZEPAppOutcome outcome = ChangeSetting(session.File(), controls, *control, iRequest.value, session.PLMRepository());
   if (outcome.code != kExitOk) {
-    err << "error: " << outcome.message << "\nnothing was changed\n";
+    err << "error: " << outcome.message << (outcome.code == kExitFile ? "\n" : "\nnothing was changed\n");
     return outcome.code;
   }
   if (!outcome.warning.empty()) err << "warning: " << outcome.warning << "\n";
-  if (outcome.changed && FAILED(session.File().SaveAll())) {
-    err << "error: the change was not saved: " << session.File().LastError() << "\n";
-    return kExitFile;
-  }
   out << outcome.message;
   const ZEPAppSetting* setting = SettingOf(*page, control->name);
   if (setting && setting->defaults.size() > 1 && range)
@@ -725,7 +768,7 @@ int Completion(std::ostream& out) {
   out << "# bash completion for " << kAppName << ": source it, or put it in ~/.local/share/bash-completion/completions/\n"
       << "_drafting_options() {\n"
       << "  local cur=${COMP_WORDS[COMP_CWORD]} prev=${COMP_WORDS[COMP_CWORD-1]} words\n"
-      << "  local commands=\"pages show get set reset lock unlock default locks list render sketcher completion\"\n"
+      << "  local commands=\"pages show get set reset lock unlock default locks list render serve sketcher completion\"\n"
       << "  local pages=\"" << pages.substr(1) << "\"\n"
       << "  local keys=\"" << keys.substr(1) << "\"\n"
       << "  case \"$prev\" in\n"
@@ -757,19 +800,11 @@ int Render(const Request& iRequest, std::ostream& out, std::ostream& err) {
   for (const ZEPAppPage* page : pages) {
     std::vector<ZEPAppControl> controls;
     if (int rc = session.Controls(*page, 0, controls)) return rc;
-    std::string note;
     if (ShownRange(controls)) {
       if (int rc = session.Controls(*page, iRequest.range, controls)) return rc;
       ranged = true;
-      note = std::string(page->name == "main" ? "Scale ratio" : "Spacing and graduations") + " of the " +
-             ScaleName(ShownRange(controls)) + " scale range";
     }
-    ZEPAppRenderPage shown{page->name, page->title, session.Open(*page), note, {}, {}};
-    for (const ZEPAppControl& c : controls)
-      if (c.opener && (shown.dialogs.empty() || shown.dialogs.back().dialog != c.subDialog))
-        shown.dialogs.push_back({c.opener, c.subDialog});
-    for (const ZEPAppControl& c : controls) shown.whyNot[c.inner] = WhyRefused(controls, c);
-    rendered.push_back(shown);
+    rendered.push_back(RenderedPage(*page, session.Open(*page), controls));
   }
   if (iRequest.range && !ranged) {
     err << "error: --range applies to the pages with a scale range only (grid, main)\n";
@@ -885,12 +920,17 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
   render->add_option("--html", r.html, "Output file, - for standard output")->required();
   render->add_option("pages", r.pages, "Pages to draw (default: all)");
   rangeOption(render);
+  CLI::App* serve = app.add_subcommand(
+      "serve", "Serve the pages as a live dialog in the browser: each change applies and is saved at once");
+  serve->add_option("--port", r.port, "Port on 127.0.0.1 (default: a free one)")->check(CLI::Range(0, 65535));
+  serve->add_flag("--no-open", r.noOpen, "Only print the address; do not ask the desktop to open it");
+  serve->footer("Runs until interrupted (Ctrl+C). The address it prints carries a token that every request needs.");
   CLI::App* completion = app.add_subcommand("completion", "Print a completion script for a shell");
   std::string shell;
   completion->add_option("shell", shell, "bash")->required()->check(CLI::IsMember({"bash"}));
   app.footer("Exit codes: 0 done; 1 unexpected (or the output could not be written, or the catalogs are missing); "
              "2 bad command line or unknown name; 3 refused (locked or disabled); 4 a value the control does not "
-             "take; 5 a settings file that cannot be read or written.");
+             "take; 5 a settings file that cannot be read or written. serve: 0 once interrupted; 1 when it cannot listen.");
 
   try {
     app.parse(argc, argv);
@@ -918,6 +958,7 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
   if (*list) return List(r, out, err);
   if (*locks) return Locks(r, out, err);
   if (*render) return Render(r, out, err);
+  if (*serve) return RunServe(ResolveSettingsPaths(r.settings, r.admin), {r.port, !r.noOpen, r.standards, r.plm}, out, err);
   if (*sketcher) return Sketcher(r, out, err);
   if (*completion) return Completion(out);
   if (*get) return TakeKey(r, 0, 0, err) ? kExitUsage : Get(r, out, err);

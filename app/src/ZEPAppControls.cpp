@@ -1106,6 +1106,12 @@ ZEPAppOutcome SelectRange(const std::vector<ZEPAppControl>& iControls, int iRang
   return Done(*range, true);
 }
 
+std::vector<std::string> ZEPAppControl::ChoiceTexts() const {
+  const ZEPAppKind kind = Kind();
+  if (kind != ZEPAppKind::Combo && kind != ZEPAppKind::Choice) return {};
+  return Choices(*this);
+}
+
 std::size_t TextWidth(const std::string& iText) {
   std::size_t n = 0;
   for (unsigned char c : iText)

@@ -49,6 +49,8 @@ struct ZEPAppControl {
   bool Disabled() const;
   // What a value for this control may be, for error messages.
   std::string Accepts() const;
+  // What the user picks from: a combo's lines, a group's choices; empty for other kinds.
+  std::vector<std::string> ChoiceTexts() const;
 };
 
 // Every control of a page, in tree order, then those of each sub-dialog that iDialogButtons

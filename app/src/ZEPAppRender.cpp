@@ -155,6 +155,8 @@ std::string Attributes(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::s
   else if (!w.IsEffectivelyEnabled() && !ZEPSysDynamicCast<ZEPDlgLock>(const_cast<ZEPDialog*>(&w)))
     iClass += " disabled";
   std::string out = " class=\"" + iClass + "\" data-name=\"" + EscapeHtml(w.GetOwnName()) + "\"";
+  if (auto control = iPage.controlOf.find(&w); control != iPage.controlOf.end())
+    out += " data-control=\"" + EscapeHtml(control->second) + "\"";
   if (!iTooltip.empty()) out += " title=\"" + EscapeHtml(iTooltip) + "\"";
   const std::string style = CellStyle(w);
   if (!style.empty()) out += " style=\"" + style + "\"";
@@ -372,6 +374,22 @@ void Render(const ZEPDialog& w, const ZEPAppRenderPage& iPage, std::string& out)
 
 } // namespace
 
+std::string RenderPageHtml(const ZEPAppRenderPage& iPage) {
+  const ZEPAppRenderPage& p = iPage;
+  std::string out = "<section class=\"page\" id=\"page-" + EscapeHtml(p.name) +
+                    "\" role=\"tabpanel\">\n<h2>" + EscapeHtml(p.title) + "</h2>\n";
+  if (!p.note.empty()) out += "<p class=\"note\">" + EscapeHtml(p.note) + "</p>\n";
+  if (p.frame) {
+    out += "<div class=\"pagegrid\">";
+    Children(*p.frame, p, out);
+    out += "</div>\n";
+  }
+  for (const ZEPAppRenderDialog& d : p.dialogs)
+    if (d.dialog) RenderDialog(p, *d.dialog, out);
+  out += "</section>\n";
+  return out;
+}
+
 std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages,
                        const ZEPAppRenderContext& iContext) {
   std::string out;
@@ -405,19 +423,7 @@ std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages,
     out += "<label for=\"tab-" + EscapeHtml(p.name) + "\" role=\"tab\">" + EscapeHtml(p.title) +
            "</label>";
   out += "</div>\n<div class=\"panels\">\n";
-  for (const ZEPAppRenderPage& p : iPages) {
-    out += "<section class=\"page\" id=\"page-" + EscapeHtml(p.name) +
-           "\" role=\"tabpanel\">\n<h2>" + EscapeHtml(p.title) + "</h2>\n";
-    if (!p.note.empty()) out += "<p class=\"note\">" + EscapeHtml(p.note) + "</p>\n";
-    if (p.frame) {
-      out += "<div class=\"pagegrid\">";
-      Children(*p.frame, p, out);
-      out += "</div>\n";
-    }
-    for (const ZEPAppRenderDialog& d : p.dialogs)
-      if (d.dialog) RenderDialog(p, *d.dialog, out);
-    out += "</section>\n";
-  }
+  for (const ZEPAppRenderPage& p : iPages) out += RenderPageHtml(p);
   out += "</div>\n</div>\n<div class=\"footer\">";
   out += "<span>Settings: <code>" +
          EscapeHtml(iContext.settingsPath.empty() ? "none (not saved)" : iContext.settingsPath) +

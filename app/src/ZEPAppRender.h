@@ -25,6 +25,9 @@ struct ZEPAppRenderPage {
   std::vector<ZEPAppRenderDialog> dialogs;
   // Why a control the user cannot operate is so, by its operable widget: its tooltip says it.
   std::map<const ZEPDialog*, std::string> whyNot;
+  // The control each operable widget is, by name: marked for the live dialog's script
+  // (data-control); empty for a picture.
+  std::map<const ZEPDialog*, std::string> controlOf;
 };
 
 struct ZEPAppRenderContext {
@@ -37,6 +40,9 @@ struct ZEPAppRenderContext {
 // The whole document. The first page is the tab shown first; no script, no external resource.
 std::string RenderHtml(const std::vector<ZEPAppRenderPage>& iPages,
                        const ZEPAppRenderContext& iContext);
+
+// One page's section of that document, sub-dialogs included.
+std::string RenderPageHtml(const ZEPAppRenderPage& iPage);
 
 // Text made safe for HTML content and attribute values.
 std::string EscapeHtml(const std::string& iText);
