@@ -424,32 +424,24 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     // Another process wrote the file: the document that told what the repository was given has
     // been replaced (and that kept apart), and the changes pointed into it.
     if (userReads != reads) changes = ChangesOf(key, iRepo);
-    // The changes go into the file's content in place; what they replace is kept to be put
-    // back if the file cannot be written.
+    // The changes go into the file's content in place.
     auto& repos = user.doc.Of(iKind);
     auto repo = repos.find(iRepo.GetName());
-    const bool newRepo = repo == repos.end();
-    if (newRepo) repo = repos.emplace(iRepo.GetName(), ZEPAppRepoEntries()).first;
+    if (repo == repos.end()) repo = repos.emplace(iRepo.GetName(), ZEPAppRepoEntries()).first;
     ZEPAppRepoEntries& entries = repo->second;
-    std::vector<std::pair<const std::string*, std::optional<ZEPAppAttrEntry>>> replaced;
-    replaced.reserve(changes.size());
     ForEachPlace(entries, changes, [&](ZEPAppRepoEntries::iterator& ioAt, const Change& c) {
       const bool there = ioAt != entries.end() && ioAt->first == c.name;
-      replaced.emplace_back(&c.name, there ? std::optional<ZEPAppAttrEntry>(std::move(ioAt->second)) : std::nullopt);
       if (c.value) {
         if (!there) ioAt = entries.emplace_hint(ioAt, c.name, ZEPAppAttrEntry());
-        ioAt->second = ZEPAppAttrEntry{*c.value, false, std::string()};
+        ioAt->second.value = *c.value; // a value of the same kind and count keeps its storage
         ++ioAt;
       } else if (there) ioAt = entries.erase(ioAt);
     });
     if (entries.empty()) repos.erase(repo);
     if (long rc = WriteDoc(user, false); FAILED(rc)) {
-      auto& back = repos[iRepo.GetName()];
-      for (auto& [name, old] : replaced) {
-        if (old) back[*name] = std::move(*old);
-        else back.erase(*name);
-      }
-      if (back.empty() && newRepo) repos.erase(iRepo.GetName());
+      // The file holds what it held: its document is read from those bytes again when needed.
+      user.doc = ZEPAppSettingsDoc();
+      user.parsed = false;
       return rc;
     }
     // What the repository was given becomes what it holds: the document says so now, a value
