@@ -142,13 +142,11 @@ bool ReadRegularFile(const std::string& iPath, std::size_t iMaxSize, std::string
     ::close(fd);
     return false;
   }
-  // Read straight into the text, in as few calls as the size fstat tells allows. That size may
-  // be wrong (a file growing meanwhile): the text grows as needed, and the read is bounded.
-  std::size_t size = 0;
-  oText.resize(std::min(static_cast<std::size_t>(std::max<off_t>(st.st_size, 0)), iMaxSize) + 1);
+  // The size fstat tells may be wrong (a file growing meanwhile); the read itself is bounded.
+  if (st.st_size > 0) oText.reserve(std::min(static_cast<std::size_t>(st.st_size), iMaxSize));
+  char buffer[65536];
   for (;;) {
-    if (size == oText.size()) oText.resize(std::min(2 * size, iMaxSize + 1));
-    const ssize_t n = ::read(fd, &oText[size], oText.size() - size);
+    const ssize_t n = ::read(fd, buffer, sizeof buffer);
     if (n < 0 && errno == EINTR) continue;
     if (n < 0) {
       oError = "cannot read: " + Why(LastErrno());
@@ -157,15 +155,14 @@ bool ReadRegularFile(const std::string& iPath, std::size_t iMaxSize, std::string
       return false;
     }
     if (n == 0) break;
-    size += static_cast<std::size_t>(n);
-    if (size > iMaxSize) {
+    if (oText.size() + static_cast<std::size_t>(n) > iMaxSize) {
       oError = "is larger than " + std::to_string(iMaxSize) + " bytes, too large for a settings file";
       ::close(fd);
       oText.clear();
       return false;
     }
+    oText.append(buffer, static_cast<std::size_t>(n));
   }
-  oText.resize(size);
   ::close(fd);
   return true;
 }
