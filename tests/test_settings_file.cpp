@@ -323,6 +323,23 @@ TEST_F(SettingsFileTest, SavesKeepWhatAnotherProcessWroteSinceTheLoad) {
     EXPECT_EQ(std::nullopt, stored("W"));
     EXPECT_EQ(7, stored("A"));
   }
+
+  // A repository the other process added, opened after a save that failed, gets its values.
+  auto ops = std::make_shared<FaultyOps>();
+  WriteBytes(_user, "{\"settings\": {\"R\": {\"A\": {\"int\": 1}}}}");
+  ZEPSysSettingRepository::CloseAll();
+  ZEPAppSettingsFile store(ops);
+  ASSERT_EQ(S_OK, store.Load(_user.string()));
+  ZEPSysSettingRepository* repo = store.OpenSettings("R");
+  WriteBytes(_user, "{\"settings\": {\"R\": {\"A\": {\"int\": 1}}, \"S\": {\"X\": {\"int\": 9}}}}");
+  const int two = 2;
+  repo->WriteAttr("A", &two, 1);
+  ops->failAt = FaultyOps::RenameStep;
+  EXPECT_LT(repo->SaveRepository(), 0);
+  ops->failAt = FaultyOps::None;
+  EXPECT_EQ(std::vector<int>{9}, Read<int>(store.OpenSettings("S"), "X", 1));
+  ASSERT_EQ(S_OK, repo->SaveRepository()) << store.LastError();
+  EXPECT_NE(std::string::npos, ReadBytes(_user).find("\"X\"")) << ReadBytes(_user);
 }
 
 TEST_F(SettingsFileTest, FailedSaveLeavesTheOldFileAndNoTemporaryFile) {

@@ -146,7 +146,9 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
   // document no longer tells it.
   std::map<RepoKey, std::map<std::string, ZEPAppValue>> baseline;
   std::map<RepoKey, std::set<std::string>> erased;
-  std::size_t userReads = 0; // how often the user's document was replaced by another reading
+  // Whether `loaded` names every repository of the user's file as it is now (a quick load,
+  // and the bytes not replaced since): a repository it does not name has nothing in the file.
+  bool quickLoad = false;
 
   long Fail(std::string iWhy) {
     lastError = std::move(iWhy);
@@ -278,7 +280,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
       if (read && onDisk && ioFile.onDisk && !ioFile.fault && bytes == ioFile.bytes) return true;
       if (&ioFile == &user) {
         KeepBaselines();
-        ++userReads;
+        quickLoad = false;
       }
       ioFile.doc = ZEPAppSettingsDoc();
       ioFile.parsed = true;
@@ -289,6 +291,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
         oFaults.push_back(err);
       } else if (oValues && ReadSettingsValues(ioFile.bytes, *oValues)) {
         ioFile.parsed = false;
+        quickLoad = true;
       } else {
         if (oValues) *oValues = ZEPAppSettingsValues();
         std::vector<ZEPAppFileError> faults = ParseSettingsText(ioFile.bytes, ioFile.path, iAdmin, ioFile.doc);
@@ -335,7 +338,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     if (it != staged.end() && !handedOut.count(key)) { // from a quick load: moved, not copied
       ioRepo.SetUserValues(std::move(it->second));
       handedOut.insert(key);
-    } else if (user.parsed || it != staged.end()) { // else the file has nothing for it
+    } else if (!quickLoad || it != staged.end()) { // else the file has nothing for it
       const auto& users = Doc(user).Of(iKind);
       if (auto repo = users.find(key.second); repo != users.end())
         for (const auto& [attr, entry] : repo->second) // in order: each insertion goes at the end
@@ -418,38 +421,28 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
                                 user.fault->Text() + ")");
     if (changes.empty()) return S_OK;
 
+    // Should another process have written the file meanwhile, what the repository was given
+    // is kept apart as its document is replaced: the changes stay what they are.
     ZEPAppFileLock lock;
-    const std::size_t reads = userReads;
     if (!LockAndReread(user, false, lock)) return E_FAIL;
-    // Another process wrote the file: the document that told what the repository was given has
-    // been replaced (and that kept apart), and the changes pointed into it.
-    if (userReads != reads) changes = ChangesOf(key, iRepo);
-    // The changes go into the file's content in place; what they replace is kept to be put
-    // back if the file cannot be written.
+    // The changes go into the file's content in place.
     auto& repos = user.doc.Of(iKind);
     auto repo = repos.find(iRepo.GetName());
-    const bool newRepo = repo == repos.end();
-    if (newRepo) repo = repos.emplace(iRepo.GetName(), ZEPAppRepoEntries()).first;
+    if (repo == repos.end()) repo = repos.emplace(iRepo.GetName(), ZEPAppRepoEntries()).first;
     ZEPAppRepoEntries& entries = repo->second;
-    std::vector<std::pair<const std::string*, std::optional<ZEPAppAttrEntry>>> replaced;
-    replaced.reserve(changes.size());
     ForEachPlace(entries, changes, [&](ZEPAppRepoEntries::iterator& ioAt, const Change& c) {
       const bool there = ioAt != entries.end() && ioAt->first == c.name;
-      replaced.emplace_back(&c.name, there ? std::optional<ZEPAppAttrEntry>(std::move(ioAt->second)) : std::nullopt);
       if (c.value) {
         if (!there) ioAt = entries.emplace_hint(ioAt, c.name, ZEPAppAttrEntry());
-        ioAt->second = ZEPAppAttrEntry{*c.value, false, std::string()};
+        ioAt->second.value = *c.value; // a value of the same kind and count keeps its storage
         ++ioAt;
       } else if (there) ioAt = entries.erase(ioAt);
     });
     if (entries.empty()) repos.erase(repo);
     if (long rc = WriteDoc(user, false); FAILED(rc)) {
-      auto& back = repos[iRepo.GetName()];
-      for (auto& [name, old] : replaced) {
-        if (old) back[*name] = std::move(*old);
-        else back.erase(*name);
-      }
-      if (back.empty() && newRepo) repos.erase(iRepo.GetName());
+      // The file holds what it held: its document is read from those bytes again when needed.
+      user.doc = ZEPAppSettingsDoc();
+      user.parsed = false;
       return rc;
     }
     // What the repository was given becomes what it holds: the document says so now, a value
@@ -551,6 +544,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
       if (FAILED(WriteFileAtomically(*ops, ioFile.path, text, err))) return Fail(err);
       ioFile.bytes = std::move(text);
       ioFile.onDisk = true;
+      if (&ioFile == &user) quickLoad = false;
     }
     return S_OK;
   }
@@ -653,6 +647,7 @@ long ZEPAppSettingsFile::Load(const std::string& iUserPath, const std::string& i
   d.baseline.clear();
   d.loaded = ZEPAppSettingsValues();
   d.handedOut.clear();
+  d.quickLoad = false;
   d.user = Impl::File();
   d.user.path = iUserPath;
   d.admin = Impl::File();

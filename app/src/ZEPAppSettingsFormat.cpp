@@ -787,10 +787,15 @@ public:
   }
   // Starts an element of the array open now.
   void Element() { Next(); }
+  // Runs of characters that need no escape are appended whole.
   void String(const std::string& iText) {
     _out += '"';
-    for (char ch : iText) {
-      const unsigned char c = static_cast<unsigned char>(ch);
+    std::size_t run = 0;
+    for (std::size_t i = 0; i < iText.size(); ++i) {
+      const unsigned char c = static_cast<unsigned char>(iText[i]);
+      if (c >= 0x20 && c != '"' && c != '\\') continue;
+      _out.append(iText, run, i - run);
+      run = i + 1;
       switch (c) {
       case '"': _out += "\\\""; break;
       case '\\': _out += "\\\\"; break;
@@ -799,15 +804,15 @@ public:
       case '\n': _out += "\\n"; break;
       case '\r': _out += "\\r"; break;
       case '\t': _out += "\\t"; break;
-      default:
-        if (c < 0x20) {
-          static const char kHex[] = "0123456789abcdef";
-          _out += "\\u00";
-          _out += kHex[c >> 4];
-          _out += kHex[c & 15];
-        } else _out += ch;
+      default: {
+        static const char kHex[] = "0123456789abcdef";
+        _out += "\\u00";
+        _out += kHex[c >> 4];
+        _out += kHex[c & 15];
+      }
       }
     }
+    _out.append(iText, run, std::string::npos);
     _out += '"';
   }
   void Number(double iValue) {
@@ -861,8 +866,9 @@ bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string&
     w.Open('{');
     for (const auto& [repo, entries] : iDoc.Of(kind)) {
       bool repoOpen = false; // a repository with nothing to write is left out
+      const bool repoNameBad = ZEPFirstBadUtf8(repo) != kNone;
       for (const auto& [attr, entry] : entries) {
-        if (ZEPFirstBadUtf8(repo) != kNone || ZEPFirstBadUtf8(attr) != kNone || ZEPFirstBadUtf8(entry.by) != kNone) {
+        if (repoNameBad || ZEPFirstBadUtf8(attr) != kNone || ZEPFirstBadUtf8(entry.by) != kNone) {
           oError = std::string(section) + "/" + repo + "/" + attr + " cannot be saved: its name is not valid UTF-8";
           return false;
         }
