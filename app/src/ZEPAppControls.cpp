@@ -1106,6 +1106,20 @@ ZEPAppOutcome SelectRange(const std::vector<ZEPAppControl>& iControls, int iRang
   return Done(*range, true);
 }
 
+std::vector<ZEPAppOffer> OfferedValues(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl) {
+  std::vector<ZEPAppOffer> offers;
+  if (iControl.name == kAddPLMStandard) {
+    for (const ZEPPLMSetup::Standard& s : ZEPPLMSetup::Repository())
+      offers.push_back({s.name + "  (key " + s.key + ")", s.key});
+  } else if (iControl.name == kRemovePLMStandard) {
+    if (const ZEPAppControl* combo = ByName(iControls, kStandardCombo))
+      if (const ZEPDlgCombo* lines = PickableCombo(combo->inner))
+        for (const StandardLine& l : StandardLines(*lines))
+          if (!l.key.empty()) offers.push_back({l.text + "  (key " + l.key + ")", l.key});
+  }
+  return offers;
+}
+
 std::vector<std::string> ZEPAppControl::ChoiceTexts() const {
   const ZEPAppKind kind = Kind();
   if (kind != ZEPAppKind::Combo && kind != ZEPAppKind::Choice) return {};

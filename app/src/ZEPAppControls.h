@@ -53,6 +53,15 @@ struct ZEPAppControl {
   std::vector<std::string> ChoiceTexts() const;
 };
 
+// A value a button that takes one is offered with: what the user reads, and what to give it.
+struct ZEPAppOffer {
+  std::string text, value;
+};
+// What the buttons that take a value offer (adding a PLM standard: the PLM repository's
+// standards as the chooser lists them; removing one: the listed PLM standards); empty for
+// every other control.
+std::vector<ZEPAppOffer> OfferedValues(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl);
+
 // Every control of a page, in tree order, then those of each sub-dialog that iDialogButtons
 // open: each button the user can press is pressed through the driver and its dialog stays
 // open. Sub-dialogs opened by an earlier call are closed first, which ends the controls that

@@ -126,9 +126,20 @@ private:
 };
 
 // What the page's script needs beyond what show --json says of a control.
-void AddLiveFields(const ZEPAppControl& iControl, nlohmann::json& ioJson) {
+void AddLiveFields(const std::vector<ZEPAppControl>& iControls, const ZEPAppControl& iControl,
+                   nlohmann::json& ioJson) {
   const std::vector<std::string> choices = iControl.ChoiceTexts();
   if (!choices.empty()) ioJson["choices"] = choices;
+  // A button that takes a value offers a list to pick from; the pick sends its value.
+  if (const std::vector<ZEPAppOffer> offers = OfferedValues(iControls, iControl); !offers.empty()) {
+    nlohmann::json texts = nlohmann::json::array(), values = nlohmann::json::array();
+    for (const ZEPAppOffer& o : offers) {
+      texts.push_back(o.text);
+      values.push_back(o.value);
+    }
+    ioJson["choices"] = std::move(texts);
+    ioJson["values"] = std::move(values);
+  }
   if (ZEPSysDynamicCast<ZEPComboColor>(iControl.inner)) ioJson["colour"] = true;
   if (auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(iControl.inner)) {
     double lo = 0, hi = 0, step = 0;
@@ -153,7 +164,7 @@ nlohmann::json PagesState(LiveSession& ioSession, const ZEPAppRanges& iRanges, c
     for (const ZEPAppControl& c : controls) {
       shown.controlOf[c.inner] = c.name;
       nlohmann::json j = ControlJson(page, controls, c);
-      AddLiveFields(c, j);
+      AddLiveFields(controls, c, j);
       list.push_back(std::move(j));
     }
     pages.push_back({{"page", page.name},
@@ -266,6 +277,8 @@ struct ZEPAppServer::Impl {
   nlohmann::json StateLocked(const ZEPAppRanges& iRanges) {
     // The stamp before reading: a write in between shows as a newer stamp at the next poll.
     const std::string stamp = SettingsStamp(paths);
+    std::string unusable; // said when a standard is added; the page then offers none
+    LoadPLMRepository(plmRepository, unusable);
     LiveSession session(paths);
     nlohmann::json state = PagesState(session, iRanges, paths, nullptr);
     state["stamp"] = stamp;

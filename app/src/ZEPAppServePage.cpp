@@ -174,7 +174,8 @@ const char* const kLiveScript = R"JS(
       item.setAttribute('role', 'option');
       item.textContent = line;
       if (line === control.shown) item.className = 'sel';
-      item.addEventListener('click', function (ev) { ev.stopPropagation(); closeMenu(); send(page, control, i + 1); });
+      const value = control.values ? control.values[i] : i + 1; // a button's pick sends its value
+      item.addEventListener('click', function (ev) { ev.stopPropagation(); closeMenu(); send(page, control, value); });
       menu.appendChild(item);
     });
     if (control.colour) {
@@ -249,6 +250,10 @@ const char* const kLiveScript = R"JS(
         return true;
       case 'button':
         if (el.tagName === 'A') return false; // its dialog opens in the page
+        if (control.values) { // it takes one of the values it offers
+          openMenu(page, control, el);
+          return true;
+        }
         send(page, control, 'open');
         return true;
       case 'spinner': {
