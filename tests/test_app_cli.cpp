@@ -131,12 +131,6 @@ protected:
   std::string _settings, _admin;
 };
 
-// iText holds iPart; the failure shows the whole text.
-::testing::AssertionResult Has(const std::string& iText, const std::string& iPart) {
-  if (iText.find(iPart) != std::string::npos) return ::testing::AssertionSuccess();
-  return ::testing::AssertionFailure() << "\"" << iPart << "\" is not in:\n" << iText;
-}
-
 // The run ended with iCode and said iPart (on either stream).
 ::testing::AssertionResult Says(const Result& iRun, int iCode, const std::string& iPart) {
   if (iRun.code == iCode && (iRun.err + iRun.out).find(iPart) != std::string::npos)
