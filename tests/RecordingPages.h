@@ -234,10 +234,11 @@ protected:
   ZEPDlgRadioButton* Radio(const std::string& iName, ZEPDialog* iIn = nullptr) {
     return As<ZEPDlgRadioButton>(iName, iIn);
   }
-  // A check button or radio button that is on; false for any other widget.
+  // A check button or radio button that is on; any other widget, or none, fails the test.
   bool Checked(const std::string& iName, ZEPDialog* iIn = nullptr) {
     if (auto* radio = Radio(iName, iIn)) return radio->GetState() == ZEPDlgChecked;
     auto* check = As<ZEPDlgCheckButton>(iName, iIn);
+    if (!check) ADD_FAILURE() << iName << " is no check or radio button";
     return check && check->GetState() == ZEPDlgChecked;
   }
   bool Enabled(const std::string& iName, ZEPDialog* iIn = nullptr) {

@@ -380,8 +380,7 @@ TEST_F(AppCli, BinarySetGetLockAndRender) {
   Result set = RunBinary({"set", "grid", spacing->control, "2.5cm"});
   ASSERT_EQ(set.code, 0) << set.err;
   EXPECT_EQ(Stored(spacing->repository, spacing->stored)[0], 25.0);
-  EXPECT_EQ(RunBinary({"get", "grid", spacing->control}).out,
-            "25 mm\n"); // a new run reads the file
+  EXPECT_EQ(RunBinary({"get", "grid", spacing->control}).out, "25 mm\n"); // a new run reads the file
 
   ASSERT_EQ(RunBinary({"lock", spacing->stored}).code, 0);
   const std::string before = ReadBytes(_settings);
