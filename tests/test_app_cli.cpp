@@ -277,8 +277,7 @@ TEST_F(AppCli, PaperUnitChangesWhatPaperLengthsShow) {
 TEST_F(AppCli, LockedSettingIsRefusedEverywhereAndShowsItsPadlock) {
   const ZEPAppSetting* unit = FindSetting("General", "PaperLengthUnit");
   ASSERT_EQ(Run({"set", "general", unit->control, "cm"}).code, kExitOk);
-  Result locked = Run({"lock", unit->stored});
-  ASSERT_EQ(locked.code, kExitOk) << locked.err;
+  ASSERT_TRUE(Says(Run({"lock", unit->stored}), kExitOk, ""));
   const std::string who = CurrentUserName();
   const std::string where = fs::absolute(_admin).lexically_normal().string();
 
@@ -333,8 +332,7 @@ TEST_F(AppCli, RenderIsOneSelfContainedDialog) {
   setenv("ZEP_TDE_LA", "1", 1); // every section of every page is drawn
   ASSERT_EQ(Run({"lock", "Drw_settings_GridDisplay"}).code, kExitOk);
   const fs::path file = _dir / "pages.html";
-  Result r = Run({"render", "--html", file.string()});
-  ASSERT_EQ(r.code, kExitOk) << r.err;
+  ASSERT_TRUE(Says(Run({"render", "--html", file.string()}), kExitOk, ""));
   const std::string html = ReadBytes(file);
   for (const char* external : {"http:", "https:", "<link", "src=", "@import", "url(", "<script"})
     EXPECT_EQ(html.find(external), std::string::npos) << external;
@@ -377,8 +375,7 @@ TEST_F(AppCli, BinaryShowsEveryPageOnTheEmbeddedDefault) {
 
 TEST_F(AppCli, BinarySetGetLockAndRender) {
   const ZEPAppSetting* spacing = FindSetting("Grid", "PrimSpaceH");
-  Result set = RunBinary({"set", "grid", spacing->control, "2.5cm"});
-  ASSERT_EQ(set.code, 0) << set.err;
+  ASSERT_TRUE(Says(RunBinary({"set", "grid", spacing->control, "2.5cm"}), 0, ""));
   EXPECT_EQ(Stored(spacing->repository, spacing->stored)[0], 25.0);
   EXPECT_EQ(RunBinary({"get", "grid", spacing->control}).out, "25 mm\n"); // a new run reads the file
 
@@ -520,8 +517,7 @@ TEST_F(AppCli, DisplayColoursAreTypedAsNumbersHexOrLines) {
   } cases[] = {{"10 20 30", "RGB 10,20,30"}, {"#FF8000", "RGB 255,128,0"}, {"red", "Red"},
                {"3", "Red"}, {"0,0,255", "Blue"}};
   for (const auto& c : cases) {
-    Result set = Run({"set", "display", "cmbCappingColor", c.value});
-    ASSERT_EQ(set.code, kExitOk) << c.value << set.err;
+    ASSERT_TRUE(Says(Run({"set", "display", "cmbCappingColor", c.value}), kExitOk, "")) << c.value;
     EXPECT_EQ(Run({"get", "display", "cmbCappingColor"}).out, std::string(c.shown) + "\n");
   }
   for (const char* bad : {"256 0 0", "#GG0000", "1 2", "chartreuse"})
@@ -573,8 +569,7 @@ TEST_F(AppCli, EveryKeyFormNamesTheSameSetting) {
 
 TEST_F(AppCli, AdministratorLocksAtAValueAndSetsDefaultsWithoutCodes) {
   ASSERT_EQ(Run({"set", "general", "cmbPaperLengthUnit", "cm"}).code, kExitOk);
-  Result lock = Run({"lock", "general", "cmbPaperLengthUnit", "inch"});
-  ASSERT_EQ(lock.code, kExitOk) << lock.err;
+  ASSERT_TRUE(Says(Run({"lock", "general", "cmbPaperLengthUnit", "inch"}), kExitOk, ""));
   const nlohmann::json admin = nlohmann::json::parse(ReadBytes(_admin));
   const nlohmann::json& entry = admin["settings"]["DraftingOptions"]["DrwPaperLengthUnit"];
   EXPECT_EQ(entry["int"], 5);
@@ -712,10 +707,8 @@ TEST_F(AppCli, MainPageStandardsSurviveEachSaveAndReload) {
   ASSERT_EQ(run({"set", "main", "cmbStandardName", "JIS"}).code, kExitOk);
   EXPECT_EQ(texts("DrwStandardName"), Texts{"JIS"});
   // Added through the chooser by name or key; the last one added is current.
-  for (const std::string& wanted : {societe, std::string("K-3"), std::string("K-2")}) {
-    Result added = run({"set", "main", "pusStandardPLMAdd", wanted});
-    ASSERT_EQ(added.code, kExitOk) << wanted << added.err;
-  }
+  for (const std::string& wanted : {societe, std::string("K-3"), std::string("K-2")})
+    ASSERT_EQ(run({"set", "main", "pusStandardPLMAdd", wanted}).code, kExitOk) << wanted;
   EXPECT_EQ(texts("DrwStandardPLMList"), (Texts{societe, "Twin", "Twin"}));
   EXPECT_EQ(texts("DrwStandardPLMIDList"), (Texts{"K-1", "K-3", "K-2"}));
   EXPECT_EQ(texts("DrwStandardName"), Texts{"K-2"});
@@ -734,11 +727,8 @@ TEST_F(AppCli, MainPageStandardsSurviveEachSaveAndReload) {
       {"pusStandardPLMRemove", "K-9", kExitBadValue, "Twin  (key K-2)"},
   };
   const std::string before = ReadBytes(_settings);
-  for (const auto& r : refused) {
-    Result result = run({"set", "main", r.control, r.value});
-    EXPECT_EQ(result.code, r.code) << r.value;
-    EXPECT_TRUE(Has((result.err + result.out), r.told));
-  }
+  for (const auto& r : refused)
+    EXPECT_TRUE(Says(run({"set", "main", r.control, r.value}), r.code, r.told)) << r.value;
   EXPECT_EQ(ReadBytes(_settings), before);
 
   // Two standards of one name: each line is its own, by its key.
@@ -817,10 +807,8 @@ TEST_F(AppCli, ScaleRatiosPerRangeAndTheTitleBlockFolder) {
                    "warning: there is no folder \"/no/such/folder\""));
   EXPECT_EQ(nlohmann::json::parse(Run({"get", "DrwFolderTitleBlock", "--json"}).out)["stored"], "/no/such/folder");
   const std::string kept = ReadBytes(_settings);
-  for (const char* bad : {"", "  ", "bad \xC3", "two\nlines"}) {
-    Result r = Run({"set", "administration", "FrameAndTitleBlockPath", bad});
-    EXPECT_EQ(r.code, kExitBadValue) << bad;
-  }
+  for (const char* bad : {"", "  ", "bad \xC3", "two\nlines"})
+    EXPECT_EQ(Run({"set", "administration", "FrameAndTitleBlockPath", bad}).code, kExitBadValue) << bad;
   EXPECT_EQ(ReadBytes(_settings), kept);
   ASSERT_EQ(Run({"reset", "DrwFolderTitleBlock"}).code, kExitOk);
   EXPECT_EQ(Run({"get", "DrwFolderTitleBlock"}).out, "\n");
@@ -880,8 +868,7 @@ TEST_F(AppCli, StandardsFolderAndAFaultyPLMRepository) {
   EXPECT_TRUE(Has(two.err, "holds 2 values, expected 1"));
   fs::remove(_settings);
   // The shipped sample is found like the catalogs, and lists the standards the chooser offers.
-  Result sample = Run({"set", "main", "pusStandardPLMAdd", "Supplier drafting standard"});
-  EXPECT_EQ(sample.code, kExitOk) << sample.err;
+  EXPECT_TRUE(Says(Run({"set", "main", "pusStandardPLMAdd", "Supplier drafting standard"}), kExitOk, ""));
   // The rendered combo tells PLM lines from folder lines.
   const std::string html = Run({"render", "--html", "-", "main"}).out;
   EXPECT_TRUE(Has(html, "data-icon=\"I_D3M_Database\""));
