@@ -4,6 +4,7 @@
 
 #include <cmath>
 #include <limits>
+#include <set>
 
 namespace {
 #define ZEP_SETTING(Name, Kind) #Name,
@@ -17,12 +18,7 @@ using ManipPage = PageTest<RecordingManipPage>;
 
 TEST_F(ManipPage, ModuleHooksShowZerosAndEveryGetterIsRead) {
   Open(); // the zeros are in the dump
-  ASSERT_EQ(_script.reads.size(), 42u);
-  EXPECT_EQ(std::vector<std::string>(_script.reads.begin(), _script.reads.begin() + 8),
-            (std::vector<std::string>{"ManipRefSize", "ManipTransparency", "ManipZoom",
-                                      "PaperGridSpacing", "SnapToPaperGrid", "RotationSnapAngle",
-                                      "RotationAutoSnap", "SnapOnDirection"}));
-  EXPECT_EQ(_script.reads.back(), "ManipMovableDatumMod");
+  EXPECT_EQ(std::set<std::string>(_script.reads.begin(), _script.reads.end()).size(), std::size(kAttributes));
   EXPECT_EQ(ZEPCheckLog::Count(), 0);
   ExpectGolden("manip_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
 }
