@@ -33,7 +33,7 @@ const std::vector<const char*> kForce2D = {"_radioDimForce2DAlways", "_radioDimF
                                            "_radioDimForce2DNever"};
 } // namespace
 
-TEST_F(DimPage, ModuleHooksOnly) {
+TEST_F(DimPage, ModuleHooksAndAllInfoHooksAnsweringZero) {
   // The controls, their rows and states are in the dump.
   Open();
   // The approximate flag is read after the line-up values.
@@ -46,9 +46,7 @@ TEST_F(DimPage, ModuleHooksOnly) {
                 "DimCumulAddFunnel", "AssocDimOnApproximate", "DimOriginSymb"}));
   EXPECT_TRUE(_script.calls.empty());
   ExpectGolden("dim_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
-}
-
-TEST_F(DimPage, AllInfoHooksAnsweringZeroWithEveryLayoutOption) {
+  _script = HookScript();
   _script.allInfoSet = true;
   _script.options = {
       {"WithFrmCreateDriveAndChamfer", 1}, {"WithLineUpValues", 1}, {"WithFrmDimOrigin", 1}};

@@ -21,14 +21,12 @@ protected:
 };
 } // namespace
 
-TEST_F(GridPage, ModuleHooksShowZerosAndLeaveSnapOut) {
+TEST_F(GridPage, ModuleHooksAndAllInfoHooksAnsweringZero) {
   Open(); // the zeros, the disabled vertical values and no snap check are in the dump
   EXPECT_EQ(_script.reads, (std::vector<std::string>{"DisplayGrid", "SnapToPoint", "AllowDistortions", "PrimSpaceH",
                                                      "PrimSpaceV", "GradH", "GradV"}));
   ExpectGolden("grid_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
-}
-
-TEST_F(GridPage, AllInfoHooksAnsweringZero) {
+  _script = HookScript();
   _script.allInfoSet = true;
   _script.values["DisplayGrid"] = {1};
   _script.values["SnapToPoint"] = {1};
