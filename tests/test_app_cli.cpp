@@ -1,6 +1,6 @@
 // The drafting-options command line: in-process runs of RunCli, and end-to-end runs of the
 // binary, each on settings files in a fresh temporary folder.
-#include "TestSupport.h"
+#include "SettingsFileSupport.h"
 #include "ZEPAppBinding.h"
 #include "ZEPAppCli.h"
 #include "ZEPAppPages.h"
@@ -14,7 +14,6 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
-#include <random>
 #include <regex>
 #include <set>
 #include <sstream>
@@ -30,11 +29,6 @@ struct Result {
   int code = -1;
   std::string out, err;
 };
-
-std::string ReadBytes(const fs::path& iPath) {
-  std::ifstream in(iPath, std::ios::binary);
-  return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
-}
 
 // The texts of every control and section title in the page catalogs.
 std::vector<std::string> CatalogTitles() {
@@ -57,26 +51,16 @@ std::size_t Count(const std::string& iText, const std::string& iWhat) {
   return n;
 }
 
-class AppCli : public ZEPHostTest {
+class AppCli : public SettingsFolderTest {
 protected:
   void SetUp() override {
-    ZEPHostTest::SetUp();
-    std::random_device rd;
-    _dir = fs::temp_directory_path() / ("zep-cli-" + std::to_string(rd()) + std::to_string(rd()));
-    fs::create_directories(_dir);
-    _settings = (_dir / "settings.json").string();
-    _admin = (_dir / "admin.json").string();
-  }
-  void TearDown() override {
-    std::error_code ec;
-    fs::remove_all(_dir, ec);
-    ZEPHostTest::TearDown();
+    SettingsFolderTest::SetUp();
+    _settings = _user.string();
   }
 
   // In-process, on the folder's files.
   Result Run(std::vector<std::string> iArgs) {
-    std::vector<std::string> args = {"drafting-options", "--settings", _settings, "--admin",
-                                     _admin};
+    std::vector<std::string> args = {"drafting-options", "--settings", _settings, "--admin", _admin};
     args.insert(args.end(), iArgs.begin(), iArgs.end());
     std::vector<const char*> argv;
     for (const std::string& a : args)
@@ -127,8 +111,7 @@ protected:
     return values;
   }
 
-  fs::path _dir;
-  std::string _settings, _admin;
+  std::string _settings;
 };
 
 // The run ended with iCode and said iPart (on either stream).
