@@ -204,3 +204,88 @@ protected:
 private:
   unsigned char Predicate(const char* iName) { return _script.Option(iName, 1) ? 1 : 0; }
 };
+
+// A page under test: the host's script, the page opened in a window of its own, and the ways
+// the user reaches its controls. A control is looked for on the page, or in iIn when given (a
+// dialog the page opened).
+template <class P> class PageTest : public ZEPHostTest {
+protected:
+  // The host has the drafting options open: paper lengths read their unit there.
+  void SetUp() override {
+    ZEPHostTest::SetUp();
+    _pOptions = ZEPSysSettingRepository::Open("DraftingOptions");
+  }
+  // A fresh page, built and initialised; the previous one goes with its window.
+  P* Open() {
+    delete _pWindow;
+    _pWindow = new ZEPDlgWindow(&_root, "window", 0);
+    return _pPage = OpenPage<P>(_script, _pWindow);
+  }
+  ZEPDialog* Root(ZEPDialog* iIn) { return iIn ? iIn : _pPage; }
+  ZEPDialog* Find(const std::string& iName, ZEPDialog* iIn = nullptr) { return ZEPDlgDriver::Find(Root(iIn), iName); }
+  ZEPDialog* Control(const std::string& iName, ZEPDialog* iIn = nullptr) {
+    return ZEPDlgDriver::FindControl(Root(iIn), iName);
+  }
+  template <class T> T* As(const std::string& iName, ZEPDialog* iIn = nullptr) {
+    return ZEPSysDynamicCast<T>(Control(iName, iIn));
+  }
+  ZEPDlgSpinner* Spinner(const std::string& iName, ZEPDialog* iIn = nullptr) { return As<ZEPDlgSpinner>(iName, iIn); }
+  ZEPDlgCombo* Combo(const std::string& iName, ZEPDialog* iIn = nullptr) { return As<ZEPDlgCombo>(iName, iIn); }
+  ZEPDlgRadioButton* Radio(const std::string& iName, ZEPDialog* iIn = nullptr) {
+    return As<ZEPDlgRadioButton>(iName, iIn);
+  }
+  // A check button or radio button that is on; any other widget, or none, fails the test.
+  bool Checked(const std::string& iName, ZEPDialog* iIn = nullptr) {
+    if (auto* radio = Radio(iName, iIn)) return radio->GetState() == ZEPDlgChecked;
+    auto* check = As<ZEPDlgCheckButton>(iName, iIn);
+    if (!check) ADD_FAILURE() << iName << " is no check or radio button";
+    return check && check->GetState() == ZEPDlgChecked;
+  }
+  bool Enabled(const std::string& iName, ZEPDialog* iIn = nullptr) {
+    return Control(iName, iIn)->IsEffectivelyEnabled();
+  }
+  bool Click(const std::string& iName, ZEPDialog* iIn = nullptr) { return ZEPDlgDriver::Click(Control(iName, iIn)); }
+  short Row(const std::string& iName, ZEPDialog* iIn = nullptr) { return Find(iName, iIn)->GetGridConstraints().row; }
+  // The radios of a group that are on, joined by "+".
+  std::string Selected(const std::vector<const char*>& iRadios, ZEPDialog* iIn = nullptr) {
+    std::string on;
+    for (const char* name : iRadios)
+      if (Checked(name, iIn)) on += on.empty() ? name : std::string("+") + name;
+    return on;
+  }
+  std::vector<std::string> Lines(const std::string& iCombo, ZEPDialog* iIn = nullptr) {
+    std::vector<std::string> out;
+    ZEPDlgCombo* combo = Combo(iCombo, iIn);
+    for (int i = 0; combo && i < combo->GetLineCount(); ++i) {
+      ZEPUnicodeString text;
+      combo->GetLine(text, i);
+      out.push_back(text.str());
+    }
+    return out;
+  }
+  std::vector<std::string> Hooks() { return _script.Hooks(); }
+  // The first number of every call of iHook, in order.
+  std::vector<double> Written(const std::string& iHook) {
+    std::vector<double> values;
+    for (const HookCall& call : _script.Calls(iHook))
+      values.push_back(call.values.at(0));
+    return values;
+  }
+  // Presses the push button and answers the dialog of that name it opened.
+  ZEPDlgDialog* OpenDialog(const std::string& iButton, const std::string& iDialog) {
+    EXPECT_TRUE(Click(iButton)) << iButton;
+    return ZEPSysDynamicCast<ZEPDlgDialog>(Find(iDialog));
+  }
+  // The page's own children of that name (its dialogs).
+  std::vector<ZEPDialog*> Children(const std::string& iName) {
+    std::vector<ZEPDialog*> found;
+    for (ZEPDialog* child : _pPage->GetChildren())
+      if (child->GetOwnName() == iName) found.push_back(child);
+    return found;
+  }
+
+  HookScript _script;
+  P* _pPage = nullptr;
+  ZEPDlgWindow* _pWindow = nullptr;
+  ZEPSysSettingRepository* _pOptions = nullptr;
+};

@@ -27,6 +27,12 @@ inline void ExpectGolden(const std::string& iName, const std::string& iActual) {
                 << ".new";
 }
 
+// iText holds iPart; the failure shows the whole text.
+inline ::testing::AssertionResult Has(const std::string& iText, const std::string& iPart) {
+  if (iText.find(iPart) != std::string::npos) return ::testing::AssertionSuccess();
+  return ::testing::AssertionFailure() << "\"" << iPart << "\" is not in:\n" << iText;
+}
+
 // Every test starts from a host without repositories, checks or pending destructions.
 class ZEPHostTest : public ::testing::Test {
 protected:

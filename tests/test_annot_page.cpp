@@ -3,18 +3,8 @@
 #include "RecordingPages.h"
 
 namespace {
-class AnnotPage : public ZEPHostTest {
+class AnnotPage : public PageTest<RecordingAnnotPage> {
 protected:
-  void SetUp() override {
-    ZEPHostTest::SetUp();
-    ZEPSysSettingRepository::Open("DraftingOptions");
-  }
-  void Open() { _pPage = OpenPage<RecordingAnnotPage>(_script, &_root); }
-  ZEPDialog* Control(const char* iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
-  ZEPDlgRadioButton* Radio(const char* iName) {
-    return ZEPSysDynamicCast<ZEPDlgRadioButton>(Control(iName));
-  }
-  std::vector<std::string> Hooks() { return _script.Hooks(); }
   // The newer dialog the page has open, if any.
   ZEPVidFraDialog* Dialog() {
     ZEPVidFraDialog* found = nullptr;
@@ -25,11 +15,9 @@ protected:
   }
   // Presses the button and answers the dialog it opened.
   ZEPVidFraDialog* Press(const char* iButton) {
-    EXPECT_TRUE(ZEPDlgDriver::Click(Control(iButton))) << iButton;
+    EXPECT_TRUE(Click(iButton)) << iButton;
     return Dialog();
   }
-  HookScript _script;
-  RecordingAnnotPage* _pPage = nullptr;
 };
 
 const char* const kButtons[] = {"pushTableSortCustomLists", "pushLegendTableLayout"};
@@ -49,12 +37,10 @@ TEST_F(AnnotPage, TheCalloutInfoStatusChoosesTheLayout) {
   } cases[] = {{0, true}, {1, false}, {E_FAIL, false}, {E_NOTIMPL, false}};
   for (const auto& c : cases) {
     _script.info = {{"CalloutSizeOverrun", c.status}};
-    auto* window = new ZEPDlgWindow(&_root, "window", 0);
-    _pPage = OpenPage<RecordingAnnotPage>(_script, window);
-    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "toolCalloutCreation") != nullptr, c.callout) << c.status;
-    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "frmTable") != nullptr, !c.callout) << c.status;
-    EXPECT_NE(ZEPDlgDriver::Find(_pPage, "pushLegendTableLayout"), nullptr);
-    delete window;
+    Open();
+    EXPECT_EQ(Find("toolCalloutCreation") != nullptr, c.callout) << c.status;
+    EXPECT_EQ(Find("frmTable") != nullptr, !c.callout) << c.status;
+    EXPECT_NE(Find("pushLegendTableLayout"), nullptr);
   }
   _script.info.clear();
   _script.allInfoSet = true; // every info hook answers 0: the callout layout
@@ -66,11 +52,11 @@ TEST_F(AnnotPage, CalloutSizeOverrunIsAPaperLengthWrittenOnlyByTheUser) {
   _script.info = {{"CalloutSizeOverrun", 0}};
   _script.values = {{"CalloutSizeOverrun", {2.5}}, {"EnableCreateCallout", {1}}};
   Open();
-  auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(Control("edtCalloutSizeOverrun"));
+  auto* spinner = Spinner("edtCalloutSizeOverrun");
   EXPECT_DOUBLE_EQ(spinner->GetValue(), 0.0025);
   EXPECT_TRUE(_script.calls.empty()) << "opening the page writes nothing";
   ASSERT_TRUE(ZEPDlgDriver::Enter(spinner, 0.004));
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("chkEnableCreateCallout")));
+  ASSERT_TRUE(Click("chkEnableCreateCallout"));
   ASSERT_EQ(Hooks(),
             (std::vector<std::string>{"SetSysCalloutSizeOverrun", "SetSysEnableCreateCallout"}));
   EXPECT_DOUBLE_EQ(_script.calls[0].values[0], 4.0);
@@ -92,9 +78,8 @@ TEST_F(AnnotPage, EveryCheckWritesItsOwnAttribute) {
   Open();
   for (const auto& c : checks) {
     _script.calls.clear();
-    auto* check = ZEPSysDynamicCast<ZEPDlgCheckButton>(Control(c[0]));
-    EXPECT_EQ(check->GetState(), ZEPDlgChecked) << c[0];
-    ASSERT_TRUE(ZEPDlgDriver::Click(check));
+    EXPECT_TRUE(Checked(c[0])) << c[0];
+    ASSERT_TRUE(Click(c[0]));
     ASSERT_EQ(Hooks(), std::vector<std::string>{std::string("SetSys") + c[1]});
     EXPECT_EQ(_script.calls[0].values[0], 0.0);
   }
@@ -103,17 +88,15 @@ TEST_F(AnnotPage, EveryCheckWritesItsOwnAttribute) {
 TEST_F(AnnotPage, AreaFillRadiosWriteOncePerChange) {
   for (double stored : {2.0, 1.0}) {
     _script.values = {{"AreaFillOptimizationMode", {stored}}};
-    auto* window = new ZEPDlgWindow(&_root, "window", 0);
-    _pPage = OpenPage<RecordingAnnotPage>(_script, window);
-    EXPECT_EQ(Radio("radOptimImport")->GetState(), stored == 1.0 ? ZEPDlgChecked : ZEPDlgUnchecked);
-    EXPECT_EQ(Radio("radOptimGenAndGeo")->GetState(), ZEPDlgUnchecked) << stored;
-    delete window;
+    Open();
+    EXPECT_EQ(Checked("radOptimImport"), stored == 1.0) << stored;
+    EXPECT_FALSE(Checked("radOptimGenAndGeo")) << stored;
   }
   _script.values.clear();
   Open();
-  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radOptimGenAndGeo"))); // already on
-  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radOptimImport")));
-  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radOptimGenAndGeo")));
+  ASSERT_TRUE(Click("radOptimGenAndGeo")); // already on
+  ASSERT_TRUE(Click("radOptimImport"));
+  ASSERT_TRUE(Click("radOptimGenAndGeo"));
   ASSERT_EQ(Hooks(), std::vector<std::string>(2, "SetSysAreaFillOptimizationMode"));
   EXPECT_EQ(_script.calls[0].values[0], 1.0);
   EXPECT_EQ(_script.calls[1].values[0], 0.0);
@@ -157,11 +140,11 @@ TEST_F(AnnotPage, EachDialogOpensOnceAndEveryEndingFreesBothButtons) {
 
 TEST_F(AnnotPage, EventsAfterThePageIsGoneDoNothing) {
   for (const char* button : kButtons) {
-    auto* window = new ZEPDlgWindow(&_root, "window", 0);
-    _pPage = OpenPage<RecordingAnnotPage>(_script, window);
+    Open();
     ZEPVidFraDialog* dialog = Press(button);
     ASSERT_NE(dialog, nullptr);
-    delete window; // the page goes with its dialog still open
+    delete _pWindow; // the page goes with its dialog still open
+    _pWindow = nullptr;
     // The host still has the dialog until idle time; its events find no page.
     ZEPSYPEventArgs args;
     dialog->Raise(ZEPVidFraDialog::RejectButtonClicked(), &args);

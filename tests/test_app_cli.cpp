@@ -1,6 +1,6 @@
 // The drafting-options command line: in-process runs of RunCli, and end-to-end runs of the
 // binary, each on settings files in a fresh temporary folder.
-#include "TestSupport.h"
+#include "SettingsFileSupport.h"
 #include "ZEPAppBinding.h"
 #include "ZEPAppCli.h"
 #include "ZEPAppPages.h"
@@ -14,7 +14,6 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
-#include <random>
 #include <regex>
 #include <set>
 #include <sstream>
@@ -30,11 +29,6 @@ struct Result {
   int code = -1;
   std::string out, err;
 };
-
-std::string ReadBytes(const fs::path& iPath) {
-  std::ifstream in(iPath, std::ios::binary);
-  return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
-}
 
 // The texts of every control and section title in the page catalogs.
 std::vector<std::string> CatalogTitles() {
@@ -57,26 +51,16 @@ std::size_t Count(const std::string& iText, const std::string& iWhat) {
   return n;
 }
 
-class AppCli : public ZEPHostTest {
+class AppCli : public SettingsFolderTest {
 protected:
   void SetUp() override {
-    ZEPHostTest::SetUp();
-    std::random_device rd;
-    _dir = fs::temp_directory_path() / ("zep-cli-" + std::to_string(rd()) + std::to_string(rd()));
-    fs::create_directories(_dir);
-    _settings = (_dir / "settings.json").string();
-    _admin = (_dir / "admin.json").string();
-  }
-  void TearDown() override {
-    std::error_code ec;
-    fs::remove_all(_dir, ec);
-    ZEPHostTest::TearDown();
+    SettingsFolderTest::SetUp();
+    _settings = _user.string();
   }
 
   // In-process, on the folder's files.
   Result Run(std::vector<std::string> iArgs) {
-    std::vector<std::string> args = {"drafting-options", "--settings", _settings, "--admin",
-                                     _admin};
+    std::vector<std::string> args = {"drafting-options", "--settings", _settings, "--admin", _admin};
     args.insert(args.end(), iArgs.begin(), iArgs.end());
     std::vector<const char*> argv;
     for (const std::string& a : args)
@@ -127,9 +111,16 @@ protected:
     return values;
   }
 
-  fs::path _dir;
-  std::string _settings, _admin;
+  std::string _settings;
 };
+
+// The run ended with iCode and said iPart (on either stream).
+::testing::AssertionResult Says(const Result& iRun, int iCode, const std::string& iPart) {
+  if (iRun.code == iCode && (iRun.err + iRun.out).find(iPart) != std::string::npos)
+    return ::testing::AssertionSuccess();
+  return ::testing::AssertionFailure() << "exit code " << iRun.code << " (expected " << iCode << "), \""
+                                       << iPart << "\" expected in:\n" << iRun.err << iRun.out;
+}
 
 // The number a spinner shows and its unit symbol.
 std::pair<double, std::string> Shown(const std::string& iText) {
@@ -144,104 +135,81 @@ std::pair<double, std::string> Shown(const std::string& iText) {
 TEST_F(AppCli, SetOperatesEachKindOfControlAndPersists) {
   const ZEPAppSetting* axis = FindSetting("General", "2DAxisLength");
   const ZEPAppSetting* frame = FindSetting("General", "ViewFrame");
-  ASSERT_TRUE(axis && frame);
+  const ZEPAppSetting* unit = FindSetting("General", "PaperLengthUnit");
+  ASSERT_TRUE(axis && frame && unit);
 
   // A check box: off, then off again (no click, nothing new written).
   EXPECT_EQ(Run({"set", "general", frame->control, "off"}).code, kExitOk);
   EXPECT_EQ(Stored(frame->repository, frame->stored), std::vector<double>{0});
   const std::string saved = ReadBytes(_settings);
-  Result again = Run({"set", "general", frame->control, "off"});
-  EXPECT_EQ(again.code, kExitOk);
-  EXPECT_NE(again.out.find("unchanged"), std::string::npos) << again.out;
+  EXPECT_TRUE(Says(Run({"set", "general", frame->control, "off"}), kExitOk, "unchanged"));
   EXPECT_EQ(ReadBytes(_settings), saved);
   EXPECT_EQ(Run({"get", "general", frame->control}).out, "off\n");
 
   // A length spinner, in its display unit or with a unit; stored in millimetres.
-  const struct {
-    const char* typed;
-    double millimetres;
-  } lengths[] = {{"40", 40.0},     {"25mm", 25.0}, {"2.5cm", 25.0},
-                 {"0.03 m", 30.0}, {"1in", 25.4},  {"1 ft", 304.8}};
-  for (const auto& l : lengths) {
-    Result r = Run({"set", "general", axis->control, l.typed});
-    ASSERT_EQ(r.code, kExitOk) << l.typed << ": " << r.err;
+  const std::pair<const char*, double> lengths[] = {{"40", 40.0},     {"25mm", 25.0}, {"2.5cm", 25.0},
+                                                    {"0.03 m", 30.0}, {"1in", 25.4},  {"1 ft", 304.8}};
+  for (const auto& [typed, millimetres] : lengths) {
+    ASSERT_EQ(Run({"set", "general", axis->control, typed}).code, kExitOk) << typed;
     ASSERT_EQ(Stored(axis->repository, axis->stored).size(), 1u);
-    EXPECT_NEAR(Stored(axis->repository, axis->stored)[0], l.millimetres, 1e-9) << l.typed;
+    EXPECT_NEAR(Stored(axis->repository, axis->stored)[0], millimetres, 1e-9) << typed;
     const auto shown = Shown(Run({"get", "general", axis->control}).out);
-    EXPECT_NEAR(shown.first, l.millimetres, 5e-4) << l.typed;
+    EXPECT_NEAR(shown.first, millimetres, 5e-4) << typed;
     EXPECT_EQ(shown.second, "mm");
   }
 
   // A combo by its line number (from 1), by its text, by the start of its text.
-  const ZEPAppSetting* unit = FindSetting("General", "PaperLengthUnit");
-  const struct {
-    const char* typed;
-    double code;
-  } lines[] = {{"2", 3}, {"Inch (in)", 5}, {"millim", 1}, {"cm", 3}};
-  for (const auto& l : lines) {
-    ASSERT_EQ(Run({"set", "general", unit->control, l.typed}).code, kExitOk) << l.typed;
-    EXPECT_EQ(Stored(unit->repository, unit->stored), std::vector<double>{l.code}) << l.typed;
+  const std::pair<const char*, double> lines[] = {{"2", 3}, {"Inch (in)", 5}, {"millim", 1}, {"cm", 3}};
+  for (const auto& [typed, code] : lines) {
+    ASSERT_EQ(Run({"set", "general", unit->control, typed}).code, kExitOk) << typed;
+    EXPECT_EQ(Stored(unit->repository, unit->stored), std::vector<double>{code}) << typed;
   }
 }
 
 TEST_F(AppCli, BadValuesAreRefusedWithWhatTheControlAccepts) {
-  const ZEPAppSetting* axis = FindSetting("General", "2DAxisLength");
-  const ZEPAppSetting* grad = FindSetting("Grid", "GradH");
-  const ZEPAppSetting* unit = FindSetting("General", "PaperLengthUnit");
+  const std::string axis = FindSetting("General", "2DAxisLength")->control;
+  const std::string grad = FindSetting("Grid", "GradH")->control;
+  const std::string unit = FindSetting("General", "PaperLengthUnit")->control;
   const struct {
     const char* page;
     std::string control;
     const char* typed;
     const char* told; // part of what the message must say
   } cases[] = {
-      {"general", axis->control, "15deg", "length unit"},
-      {"general", axis->control, "abc", "not a number"},
-      {"general", axis->control, "nan", "not a number"},
-      {"general", axis->control, "1e400", "too large"},
-      {"general", axis->control, "-1mm", "from 0 mm to"},
-      {"general", axis->control, "200m", "outside the limits"},
-      {"grid", grad->control, "12.5", "whole number"},
-      {"grid", grad->control, "3mm", "without a unit"},
-      {"grid", grad->control, "0", "from 1 to"},
-      {"general", unit->control, "4", "Inch (in)"},
-      {"general", unit->control, "parsec", "1  Millimetre (mm)"},
+      {"general", axis, "15deg", "length unit"},   {"general", axis, "abc", "not a number"},
+      {"general", axis, "nan", "not a number"},    {"general", axis, "1e400", "too large"},
+      {"general", axis, "-1mm", "from 0 mm to"},   {"general", axis, "200m", "outside the limits"},
+      {"grid", grad, "12.5", "whole number"},      {"grid", grad, "3mm", "without a unit"},
+      {"grid", grad, "0", "from 1 to"},            {"general", unit, "4", "Inch (in)"},
+      {"general", unit, "parsec", "1  Millimetre (mm)"},
       {"general", FindSetting("General", "ViewFrame")->control, "maybe", "on or off"},
   };
-  for (const auto& c : cases) {
-    Result r = Run({"set", c.page, c.control, c.typed});
-    EXPECT_EQ(r.code, kExitBadValue) << c.typed;
-    EXPECT_NE(r.err.find(c.told), std::string::npos) << c.typed << ": " << r.err;
-  }
+  for (const auto& c : cases)
+    EXPECT_TRUE(Says(Run({"set", c.page, c.control, c.typed}), kExitBadValue, c.told)) << c.typed;
   EXPECT_FALSE(fs::exists(_settings)); // nothing was ever written
 }
 
 TEST_F(AppCli, UnknownNamesListTheValidOnes) {
-  Result page = Run({"show", "nosuchpage"});
-  EXPECT_EQ(page.code, kExitUsage);
+  const std::string page = Run({"show", "nosuchpage"}).err;
   for (const ZEPAppPage& p : AppPages())
-    EXPECT_NE(page.err.find(p.name), std::string::npos) << p.name;
-
-  Result control = Run({"set", "grid", "nosuchcontrol", "1"});
-  EXPECT_EQ(control.code, kExitUsage);
+    EXPECT_TRUE(Has(page, p.name));
+  const std::string control = Run({"set", "grid", "nosuchcontrol", "1"}).err;
   for (const ZEPAppSetting& s : AppSettings())
-    if (s.page == "Grid") {
-      EXPECT_NE(control.err.find(s.control), std::string::npos) << s.control;
-    }
-
-  Result attribute = Run({"lock", "NoSuchAttribute"});
-  EXPECT_EQ(attribute.code, kExitUsage);
-  EXPECT_NE(attribute.err.find("'drafting-options list'"), std::string::npos) << attribute.err;
-  Result slip = Run({"get", "DrwPaperLenghtUnit"});
-  EXPECT_EQ(slip.code, kExitUsage);
-  EXPECT_NE(slip.err.find("Did you mean DrwPaperLengthUnit?"), std::string::npos) << slip.err;
-  Result command = Run({"shwo", "grid"});
-  EXPECT_EQ(command.code, kExitUsage);
-  EXPECT_NE(command.err.find("Did you mean show?"), std::string::npos) << command.err;
-
-  EXPECT_EQ(Run({"reset"}).code, kExitUsage);
-  EXPECT_EQ(Run({"show", "general", "--range", "2"}).code, kExitUsage); // no scale range there
-  EXPECT_EQ(Run({"show", "grid", "--range", "6"}).code, kExitUsage);
-  EXPECT_EQ(Run({"reset", "grid", "cmbGridRange"}).code, kExitUsage); // it stores nothing
+    EXPECT_TRUE(s.page != "Grid" || Has(control, s.control));
+  const struct {
+    std::vector<std::string> args;
+    const char* told;
+  } cases[] = {{{"show", "nosuchpage"}, "grid"},
+               {{"set", "grid", "nosuchcontrol", "1"}, "checkSnap"},
+               {{"lock", "NoSuchAttribute"}, "'drafting-options list'"},
+               {{"get", "DrwPaperLenghtUnit"}, "Did you mean DrwPaperLengthUnit?"},
+               {{"shwo", "grid"}, "Did you mean show?"},
+               {{"reset"}, ""},
+               {{"show", "general", "--range", "2"}, ""}, // no scale range there
+               {{"show", "grid", "--range", "6"}, ""},
+               {{"reset", "grid", "cmbGridRange"}, ""}}; // it stores nothing
+  for (const auto& c : cases)
+    EXPECT_TRUE(Says(Run(c.args), kExitUsage, c.told)) << c.args[0];
   EXPECT_EQ(Run({"--version"}).code, kExitOk);
   EXPECT_FALSE(fs::exists(_settings));
 }
@@ -249,7 +217,6 @@ TEST_F(AppCli, UnknownNamesListTheValidOnes) {
 TEST_F(AppCli, GridValuesPerScaleRangeAndTheDistortionRule) {
   const ZEPAppSetting* spacing = FindSetting("Grid", "PrimSpaceH");
   const ZEPAppSetting* vertical = FindSetting("Grid", "PrimSpaceV");
-  const ZEPAppSetting* distortions = FindSetting("Grid", "AllowDistortions");
   ASSERT_EQ(Run({"set", "grid", spacing->control, "50mm", "--range", "3"}).code, kExitOk);
   std::vector<double> expected = spacing->defaults;
   expected[2] = 50.0; // only range 3
@@ -258,12 +225,10 @@ TEST_F(AppCli, GridValuesPerScaleRangeAndTheDistortionRule) {
   EXPECT_NE(Run({"get", "grid", spacing->control}).out, "50 mm\n");
 
   // Vertical spacing follows the horizontal one until distortions are allowed for that range.
-  Result refused = Run({"set", "grid", vertical->control, "30mm"});
-  EXPECT_EQ(refused.code, kExitRefused);
-  EXPECT_NE(refused.err.find("disabled while \"Allow distortions\" is off"), std::string::npos)
-      << refused.err;
-  EXPECT_NE(Run({"show", "grid"}).out.find("(disabled)"), std::string::npos);
-  ASSERT_EQ(Run({"set", "grid", distortions->control, "on"}).code, kExitOk);
+  EXPECT_TRUE(Says(Run({"set", "grid", vertical->control, "30mm"}), kExitRefused,
+                   "disabled while \"Allow distortions\" is off"));
+  EXPECT_TRUE(Has(Run({"show", "grid"}).out, "(disabled)"));
+  ASSERT_EQ(Run({"set", "grid", "checkAllowDistortions", "on"}).code, kExitOk);
   ASSERT_EQ(Run({"set", "grid", vertical->control, "30mm"}).code, kExitOk);
   EXPECT_EQ(Stored(vertical->repository, vertical->stored)[0], 30.0);
   EXPECT_EQ(Run({"set", "grid", vertical->control, "30mm", "--range", "2"}).code, kExitRefused);
@@ -295,19 +260,14 @@ TEST_F(AppCli, PaperUnitChangesWhatPaperLengthsShow) {
 TEST_F(AppCli, LockedSettingIsRefusedEverywhereAndShowsItsPadlock) {
   const ZEPAppSetting* unit = FindSetting("General", "PaperLengthUnit");
   ASSERT_EQ(Run({"set", "general", unit->control, "cm"}).code, kExitOk);
-  Result locked = Run({"lock", unit->stored});
-  ASSERT_EQ(locked.code, kExitOk) << locked.err;
+  ASSERT_TRUE(Says(Run({"lock", unit->stored}), kExitOk, ""));
   const std::string who = CurrentUserName();
   const std::string where = fs::absolute(_admin).lexically_normal().string();
 
   const std::string before = ReadBytes(_settings);
   for (const auto& args : {std::vector<std::string>{"set", "general", unit->control, "mm"},
-                           std::vector<std::string>{"reset", "general", unit->control}}) {
-    Result r = Run(args);
-    EXPECT_EQ(r.code, kExitRefused) << args[0];
-    EXPECT_NE(r.err.find(who), std::string::npos) << r.err;
-    EXPECT_NE(r.err.find(where), std::string::npos) << r.err;
-  }
+                           std::vector<std::string>{"reset", "general", unit->control}})
+    EXPECT_TRUE(Says(Run(args), kExitRefused, "Locked by " + who + " in " + where)) << args[0];
   EXPECT_EQ(ReadBytes(_settings), before);
   // Reset of everything keeps the locked setting at the administrator's value.
   ASSERT_EQ(Run({"reset", "--all"}).code, kExitOk);
@@ -317,8 +277,8 @@ TEST_F(AppCli, LockedSettingIsRefusedEverywhereAndShowsItsPadlock) {
   std::string line, unitLine;
   while (std::getline(show, line))
     if (line.find(unit->control) != std::string::npos) unitLine = line;
-  EXPECT_NE(unitLine.find("\xF0\x9F\x94\x92"), std::string::npos) << unitLine;
-  EXPECT_NE(unitLine.find(who + " in " + where), std::string::npos) << unitLine;
+  EXPECT_TRUE(Has(unitLine, "\xF0\x9F\x94\x92"));
+  EXPECT_TRUE(Has(unitLine, who + " in " + where));
 
   const std::string html = Run({"render", "--html", "-", "general"}).out;
   const std::regex padlock("<span class=\"padlock (\\w+)\" data-name=\"" + unit->control +
@@ -326,32 +286,27 @@ TEST_F(AppCli, LockedSettingIsRefusedEverywhereAndShowsItsPadlock) {
   std::smatch m;
   ASSERT_TRUE(std::regex_search(html, m, padlock));
   EXPECT_EQ(m[1], "locked");
-  EXPECT_NE(m[2].str().find(who), std::string::npos);
+  EXPECT_TRUE(Has(m[2].str(), who));
   EXPECT_EQ(Count(html, "class=\"padlock locked\""), 2u); // this one and the legend's
 
   // Unlocked: the user may change it again; a second unlock changes nothing.
   ASSERT_EQ(Run({"unlock", unit->stored}).code, kExitOk);
-  EXPECT_NE(Run({"unlock", unit->stored}).out.find("was not locked"), std::string::npos);
+  EXPECT_TRUE(Says(Run({"unlock", unit->stored}), kExitOk, "was not locked"));
   EXPECT_EQ(Run({"set", "general", unit->control, "mm"}).code, kExitOk);
   // Locking needs an administrator's file.
-  Result noAdmin = Run({"--admin", "", "lock", unit->stored});
-  EXPECT_EQ(noAdmin.code, kExitUsage);
+  EXPECT_EQ(Run({"--admin", "", "lock", unit->stored}).code, kExitUsage);
 }
 
 TEST_F(AppCli, FaultyFileIsReportedAndNeverWritten) {
   const std::string faulty = "{\n  \"format\": 1,\n  \"settings\": [\n";
   std::ofstream(_settings, std::ios::binary) << faulty;
   Result show = Run({"show", "general"});
-  EXPECT_EQ(show.code, kExitOk);
-  EXPECT_NE(show.err.find(_settings + ":"), std::string::npos) << show.err;
+  EXPECT_TRUE(Says(show, kExitOk, _settings + ":"));
   EXPECT_FALSE(show.out.empty());
   for (const auto& args : {std::vector<std::string>{"set", "general", "checkViewFrame", "off"},
                            std::vector<std::string>{"reset", "--all"},
-                           std::vector<std::string>{"lock", "DrwViewFrame"}}) {
-    Result r = Run(args);
-    EXPECT_EQ(r.code, kExitFile) << args[0];
-    EXPECT_NE(r.err.find(_settings + ":"), std::string::npos) << r.err;
-  }
+                           std::vector<std::string>{"lock", "DrwViewFrame"}})
+    EXPECT_TRUE(Says(Run(args), kExitFile, _settings + ":")) << args[0];
   EXPECT_EQ(ReadBytes(_settings), faulty);
   EXPECT_FALSE(fs::exists(_admin));
 }
@@ -360,15 +315,14 @@ TEST_F(AppCli, RenderIsOneSelfContainedDialog) {
   setenv("ZEP_TDE_LA", "1", 1); // every section of every page is drawn
   ASSERT_EQ(Run({"lock", "Drw_settings_GridDisplay"}).code, kExitOk);
   const fs::path file = _dir / "pages.html";
-  Result r = Run({"render", "--html", file.string()});
-  ASSERT_EQ(r.code, kExitOk) << r.err;
+  ASSERT_TRUE(Says(Run({"render", "--html", file.string()}), kExitOk, ""));
   const std::string html = ReadBytes(file);
   for (const char* external : {"http:", "https:", "<link", "src=", "@import", "url(", "<script"})
     EXPECT_EQ(html.find(external), std::string::npos) << external;
   for (const ZEPAppPage& p : AppPages())
-    EXPECT_NE(html.find(">" + p.title + "<"), std::string::npos) << p.title;
+    EXPECT_TRUE(Has(html, ">" + p.title + "<"));
   for (const std::string& title : CatalogTitles())
-    EXPECT_NE(html.find(EscapeHtml(title)), std::string::npos) << title;
+    EXPECT_TRUE(Has(html, EscapeHtml(title)));
   // A padlock beside every lock-aware control of each page and its dialogs (a page embedded in
   // another shows its padlocks there too), and two in the legend; disabled ones greyed.
   // The standard combo keeps four settings under one padlock; the main page's add and remove
@@ -381,14 +335,12 @@ TEST_F(AppCli, RenderIsOneSelfContainedDialog) {
     padlocks += controls.size();
   }
   EXPECT_EQ(Count(html, "class=\"padlock "), padlocks);
-  EXPECT_NE(html.find("class=\"spinner disabled\" data-name=\"editorGridSpacingV_dialog\""),
-            std::string::npos);
-  EXPECT_NE(html.find("class=\"check on disabled\" data-name=\"checkGrid_dialog\""),
-            std::string::npos);
+  EXPECT_TRUE(Has(html, "class=\"spinner disabled\" data-name=\"editorGridSpacingV_dialog\""));
+  EXPECT_TRUE(Has(html, "class=\"check on disabled\" data-name=\"checkGrid_dialog\""));
 
   // Only the pages asked for.
   const std::string grid = Run({"render", "--html", "-", "grid"}).out;
-  EXPECT_NE(grid.find("id=\"page-grid\""), std::string::npos);
+  EXPECT_TRUE(Has(grid, "id=\"page-grid\""));
   EXPECT_EQ(grid.find("id=\"page-general\""), std::string::npos);
   EXPECT_EQ(Run({"render", "--html", "-", "nosuchpage"}).code, kExitUsage);
 }
@@ -398,33 +350,25 @@ TEST_F(AppCli, BinaryShowsEveryPageOnTheEmbeddedDefault) {
   Result r = RunBinary({}, false);
   ASSERT_EQ(r.code, 0) << r.err;
   for (const ZEPAppPage& p : AppPages())
-    EXPECT_NE(r.out.find(p.title + "  [" + p.name + "]"), std::string::npos);
-  EXPECT_NE(r.out.find((_dir / ".config/drafting-options/settings.json").string()),
-            std::string::npos)
-      << r.out;
+    EXPECT_TRUE(Has(r.out, p.title + "  [" + p.name + "]"));
+  EXPECT_TRUE(Has(r.out, (_dir / ".config/drafting-options/settings.json").string()));
   EXPECT_FALSE(fs::exists(_dir / ".config")); // showing writes nothing
   EXPECT_EQ(RunBinary({"--version"}).out.find("drafting-options "), 0u);
 }
 
 TEST_F(AppCli, BinarySetGetLockAndRender) {
   const ZEPAppSetting* spacing = FindSetting("Grid", "PrimSpaceH");
-  Result set = RunBinary({"set", "grid", spacing->control, "2.5cm"});
-  ASSERT_EQ(set.code, 0) << set.err;
+  ASSERT_TRUE(Says(RunBinary({"set", "grid", spacing->control, "2.5cm"}), 0, ""));
   EXPECT_EQ(Stored(spacing->repository, spacing->stored)[0], 25.0);
-  EXPECT_EQ(RunBinary({"get", "grid", spacing->control}).out,
-            "25 mm\n"); // a new run reads the file
+  EXPECT_EQ(RunBinary({"get", "grid", spacing->control}).out, "25 mm\n"); // a new run reads the file
 
   ASSERT_EQ(RunBinary({"lock", spacing->stored}).code, 0);
   const std::string before = ReadBytes(_settings);
-  Result refused = RunBinary({"set", "grid", spacing->control, "40mm"});
-  EXPECT_EQ(refused.code, kExitRefused);
-  EXPECT_NE(refused.err.find("Locked by " + CurrentUserName() + " in "), std::string::npos)
-      << refused.err;
+  EXPECT_TRUE(Says(RunBinary({"set", "grid", spacing->control, "40mm"}), kExitRefused,
+                   "Locked by " + CurrentUserName() + " in "));
   EXPECT_EQ(ReadBytes(_settings), before);
   // How show and render draw the padlock is the in-process tests' part.
-  Result bad = RunBinary({"set", "grid", "checkSnap", "sometimes"});
-  EXPECT_EQ(bad.code, kExitBadValue);
-  EXPECT_NE(bad.err.find("on or off"), std::string::npos);
+  EXPECT_TRUE(Says(RunBinary({"set", "grid", "checkSnap", "sometimes"}), kExitBadValue, "on or off"));
   EXPECT_EQ(RunBinary({"render", "--html", (_dir / "out.html").string()}).code, 0);
 }
 
@@ -444,43 +388,31 @@ TEST_F(AppCli, SubDialogControlsAreSetThroughTheirDialog) {
   // The sketcher reads what the geometry page wrote.
   const std::string sketcher = Run({"sketcher"}).out;
   EXPECT_TRUE(std::regex_search(sketcher, std::regex(R"(mode\s+2\n)"))) << sketcher;
-  EXPECT_TRUE(std::regex_search(sketcher, std::regex(R"(horizontal/vertical direction\s+off)")))
-      << sketcher;
+  EXPECT_TRUE(std::regex_search(sketcher, std::regex(R"(horizontal/vertical direction\s+off)"))) << sketcher;
   // show lists the dialog's controls under it.
   const std::string shown = Run({"show", "geometry"}).out;
   const auto dialog = shown.find("Solving Mode (dialog of \"Solving Mode...\")");
   ASSERT_NE(dialog, std::string::npos) << shown;
   EXPECT_GT(shown.find("frameDragMode"), dialog);
-  EXPECT_NE(shown.find("Relaxation"), std::string::npos);
+  EXPECT_TRUE(Has(shown, "Relaxation"));
 
-  Result bad = Run({"set", "geometry", "frameDragMode", "fastest"});
-  EXPECT_EQ(bad.code, kExitBadValue);
-  EXPECT_NE(bad.err.find("3  Relaxation"), std::string::npos) << bad.err;
-  Result push = Run({"set", "geometry", "dragOptionPushButton", "on"});
-  EXPECT_EQ(push.code, kExitUsage);
-  EXPECT_NE(push.err.find("opens a dialog"), std::string::npos) << push.err;
+  EXPECT_TRUE(Says(Run({"set", "geometry", "frameDragMode", "fastest"}), kExitBadValue, "3  Relaxation"));
+  EXPECT_TRUE(Says(Run({"set", "geometry", "dragOptionPushButton", "on"}), kExitUsage, "opens a dialog"));
 }
 
 TEST_F(AppCli, SubDialogsFollowTheirButtonAndTheirLocks) {
   ASSERT_EQ(Run({"set", "geometry", "checkGeomDrag", "off"}).code, kExitOk);
-  Result closed = Run({"set", "geometry", "checkDragWithEndPts", "off"});
-  EXPECT_EQ(closed.code, kExitUsage);
-  EXPECT_NE(
-      closed.err.find("\"Solving Mode...\" is disabled while \"Allow direct manipulation\" is off"),
-      std::string::npos)
-      << closed.err;
+  EXPECT_TRUE(Says(Run({"set", "geometry", "checkDragWithEndPts", "off"}), kExitUsage,
+                   "\"Solving Mode...\" is disabled while \"Allow direct manipulation\" is off"));
   ASSERT_EQ(Run({"set", "geometry", "checkGeomDrag", "on"}).code, kExitOk);
   ASSERT_EQ(Run({"lock", "Drw_settings_DragModeR14"}).code, kExitOk);
-  Result locked = Run({"set", "geometry", "frameDragMode", "relaxation"});
-  EXPECT_EQ(locked.code, kExitRefused);
-  EXPECT_NE(locked.err.find("\"Solving mode\" is locked"), std::string::npos) << locked.err;
+  EXPECT_TRUE(Says(Run({"set", "geometry", "frameDragMode", "relaxation"}), kExitRefused,
+                   "\"Solving mode\" is locked"));
   EXPECT_EQ(Run({"set", "geometry", "checkDragWithEndPts", "off"}).code, kExitOk);
   // The reference size and colour follow "Display constraints".
   ASSERT_EQ(Run({"set", "geometry", "checkCstVisu", "off"}).code, kExitOk);
-  Result colour = Run({"set", "geometry", "comboCstColor", "red"});
-  EXPECT_EQ(colour.code, kExitRefused);
-  EXPECT_NE(colour.err.find("turn \"Display constraints\" (checkCstVisu) on first"),
-            std::string::npos);
+  EXPECT_TRUE(Says(Run({"set", "geometry", "comboCstColor", "red"}), kExitRefused,
+                   "turn \"Display constraints\" (checkCstVisu) on first"));
 }
 
 TEST_F(AppCli, GeometryPageShowsTheGridPageSettings) {
@@ -494,8 +426,7 @@ TEST_F(AppCli, GeometryPageShowsTheGridPageSettings) {
 }
 
 TEST_F(AppCli, DimensionPageWithItsAssociativityDialog) {
-  Result force = Run({"set", "dimension", "_frameDimForce2D", "always"});
-  ASSERT_EQ(force.code, kExitOk) << force.err;
+  ASSERT_EQ(Run({"set", "dimension", "_frameDimForce2D", "always"}).code, kExitOk);
   EXPECT_EQ(Stored("DraftingOptions", "DrwDimAssoc3DMod"), std::vector<double>{2});
   EXPECT_EQ(Run({"set", "dimension", "chkAssocDimOnApproximate", "on"}).code, kExitOk);
   EXPECT_EQ(Run({"set", "dimension", "_frameDimCircleRadio", "2"}).code, kExitOk);
@@ -504,11 +435,8 @@ TEST_F(AppCli, DimensionPageWithItsAssociativityDialog) {
   EXPECT_EQ(Run({"set", "dimension", "_editorLineUpOffsetAngle", "0.5rad"}).code, kExitOk);
   EXPECT_NEAR(Stored("DraftingOptions", "DrwDimOffsetBetDeg")[0], 28.6479, 1e-3);
   // The line position follows the cursor rule the other way round.
-  Result followed = Run({"set", "dimension", "editorDimLinePosValue", "5mm"});
-  EXPECT_EQ(followed.code, kExitRefused);
-  EXPECT_NE(followed.err.find("is on; turn \"Dimension follows the cursor\" (checkDimSketch) off first"),
-            std::string::npos)
-      << followed.err;
+  EXPECT_TRUE(Says(Run({"set", "dimension", "editorDimLinePosValue", "5mm"}), kExitRefused,
+                   "is on; turn \"Dimension follows the cursor\" (checkDimSketch) off first"));
   ASSERT_EQ(Run({"set", "dimension", "checkDimSketch", "off"}).code, kExitOk);
   EXPECT_EQ(Run({"set", "dimension", "editorDimLinePosValue", "5mm"}).code, kExitOk);
   EXPECT_EQ(Stored("DraftingOptions", "DrwDimConstantOffsetValue"), std::vector<double>{5});
@@ -516,10 +444,9 @@ TEST_F(AppCli, DimensionPageWithItsAssociativityDialog) {
 
 // ---- manipulators and administration pages --------------------------------------------------
 TEST_F(AppCli, ManipulatorMatrixCellsAndTransparency) {
-  Result show = Run({"show", "manipulators"});
-  ASSERT_EQ(show.code, kExitOk) << show.err;
-  EXPECT_NE(show.out.find("Change symbol / Modification"), std::string::npos) << show.out;
-  EXPECT_NE(show.out.find("Move datum / Edition"), std::string::npos);
+  const Result show = Run({"show", "manipulators"});
+  EXPECT_TRUE(Says(show, kExitOk, "Change symbol / Modification"));
+  EXPECT_TRUE(Has(show.out, "Move datum / Edition"));
   ASSERT_EQ(Run({"set", "manipulators", "_checkDimChangeSymbolMod", "off"}).code, kExitOk);
   EXPECT_EQ(Stored("DraftingOptions", "DrwManipDimChangeSymbolMod"), std::vector<double>{0});
   EXPECT_EQ(Run({"get", "manipulators", "_checkDimChangeSymbolCre"}).out, "on\n");
@@ -533,49 +460,36 @@ TEST_F(AppCli, ManipulatorMatrixCellsAndTransparency) {
 TEST_F(AppCli, AdministrationRulesAreExplained) {
   ASSERT_EQ(Run({"set", "administration", "frmSelectionOnCurrentAssembly", "1"}).code, kExitOk);
   EXPECT_EQ(Stored("DraftingOptions", "DrwSelectionOnCurrentAssembly"), std::vector<double>{0});
-  Result scope = Run({"set", "administration", "chkShowWarningSelectionOutAssembly", "off"});
-  EXPECT_EQ(scope.code, kExitRefused);
-  EXPECT_NE(scope.err.find("is disabled while \"Selection scope\" is \"Elements under the "
-                           "current assembly root\"; choose"),
-            std::string::npos)
-      << scope.err;
+  EXPECT_TRUE(Says(Run({"set", "administration", "chkShowWarningSelectionOutAssembly", "off"}), kExitRefused,
+                   "is disabled while \"Selection scope\" is \"Elements under the current assembly "
+                   "root\"; choose"));
   ASSERT_EQ(Run({"set", "administration", "frmSelectionOnCurrentAssembly", "3"}).code, kExitOk);
-  ASSERT_EQ(Run({"set", "administration", "chkShowWarningSelectionOutAssembly", "on"}).code,
-            kExitOk);
-  Result favourite =
-      Run({"set", "administration", "chkShowWarningSelectionOutFavoriteContext", "off"});
-  EXPECT_EQ(favourite.code, kExitRefused);
-  EXPECT_NE(favourite.err.find("while \"Outside the current assembly\" is on"), std::string::npos)
-      << favourite.err;
+  ASSERT_EQ(Run({"set", "administration", "chkShowWarningSelectionOutAssembly", "on"}).code, kExitOk);
+  EXPECT_TRUE(Says(Run({"set", "administration", "chkShowWarningSelectionOutFavoriteContext", "off"}),
+                   kExitRefused,
+                   "while \"Outside the current assembly\" is on"));
   // Distinguishing needs one unique-name check; the view name scope needs the view names one.
   for (const char* name : {"checkSheetNamesUnicity", "checkViewNamesUnicity"})
     ASSERT_EQ(Run({"set", "administration", name, "off"}).code, kExitOk);
-  Result distinguish = Run({"set", "administration", "chkDistinguishCodeInUnicity", "on"});
-  EXPECT_EQ(distinguish.code, kExitRefused);
-  EXPECT_NE(distinguish.err.find("while all of these are off; turn \"Sheet names must be unique\""),
-            std::string::npos)
-      << distinguish.err;
-  Result viewScope = Run({"set", "administration", "frmViewNameUnicityScope", "2"});
-  EXPECT_EQ(viewScope.code, kExitRefused);
-  EXPECT_NE(viewScope.err.find("turn \"View names must be unique\" (checkViewNamesUnicity) on"),
-            std::string::npos)
-      << viewScope.err;
+  EXPECT_TRUE(Says(Run({"set", "administration", "chkDistinguishCodeInUnicity", "on"}), kExitRefused,
+                   "while all of these are off; turn \"Sheet names must be unique\""));
+  EXPECT_TRUE(Says(Run({"set", "administration", "frmViewNameUnicityScope", "2"}), kExitRefused,
+                   "turn \"View names must be unique\" (checkViewNamesUnicity) on"));
   ASSERT_EQ(Run({"set", "administration", "chkCaptureNamesUnicity", "on"}).code, kExitOk);
   EXPECT_EQ(Run({"set", "administration", "chkDistinguishCodeInUnicity", "on"}).code, kExitOk);
 }
 
 TEST_F(AppCli, BehaviorDialogRowsAreSetThroughTheirLines) {
-  Result show = Run({"show", "administration"});
-  ASSERT_EQ(show.code, kExitOk) << show.err;
-  for (const char* row : {"cmbDrwTbFontName", "cmbDrwTbPattern"})
-    EXPECT_NE(show.out.find(row), std::string::npos) << row;
+  const Result show = Run({"show", "administration"});
+  EXPECT_TRUE(Says(show, kExitOk, "cmbDrwTbFontName"));
+  EXPECT_TRUE(Has(show.out, "cmbDrwTbPattern"));
   ASSERT_EQ(Run({"set", "administration", "cmbDrwTbFrame", "no override"}).code, kExitOk);
   EXPECT_EQ(Stored("DraftingOptions", "DrwTbFrame"), std::vector<double>{3});
   ASSERT_EQ(Run({"set", "administration", "cmbDrwTbPattern", "fixed"}).code, kExitOk);
   EXPECT_EQ(Stored("DraftingOptions", "DrwTbPattern"), std::vector<double>{0});
   EXPECT_EQ(Run({"get", "administration", "cmbDrwTbPattern"}).out, "Fixed\n");
   // The dialog's place is among the user's preferences.
-  EXPECT_NE(ReadBytes(_settings).find("dlgPropTbBehaviorHeight"), std::string::npos);
+  EXPECT_TRUE(Has(ReadBytes(_settings), "dlgPropTbBehaviorHeight"));
 }
 
 // ---- annotation and display pages ----------------------------------------------------------------
@@ -586,19 +500,16 @@ TEST_F(AppCli, DisplayColoursAreTypedAsNumbersHexOrLines) {
   } cases[] = {{"10 20 30", "RGB 10,20,30"}, {"#FF8000", "RGB 255,128,0"}, {"red", "Red"},
                {"3", "Red"}, {"0,0,255", "Blue"}};
   for (const auto& c : cases) {
-    Result set = Run({"set", "display", "cmbCappingColor", c.value});
-    ASSERT_EQ(set.code, kExitOk) << c.value << set.err;
+    ASSERT_TRUE(Says(Run({"set", "display", "cmbCappingColor", c.value}), kExitOk, "")) << c.value;
     EXPECT_EQ(Run({"get", "display", "cmbCappingColor"}).out, std::string(c.shown) + "\n");
   }
   for (const char* bad : {"256 0 0", "#GG0000", "1 2", "chartreuse"})
     EXPECT_EQ(Run({"set", "display", "cmbCappingColor", bad}).code, kExitBadValue) << bad;
   // The diagnosis colours are the sketcher's: it reads what the page wrote.
   ASSERT_EQ(Run({"set", "display", "cmbOverConsElts", "1 2 3"}).code, kExitOk);
-  EXPECT_NE(Run({"sketcher"}).out.find("1 2 3 (#010203)"), std::string::npos);
+  EXPECT_TRUE(Has(Run({"sketcher"}).out, "1 2 3 (#010203)"));
   // A state's colour and the contour weight wait for their check box.
-  Result refused = Run({"set", "display", "cmbDimTrue", "red"});
-  EXPECT_EQ(refused.code, kExitRefused);
-  EXPECT_NE(refused.err.find("(chkDimTrue) on first"), std::string::npos) << refused.err;
+  EXPECT_TRUE(Says(Run({"set", "display", "cmbDimTrue", "red"}), kExitRefused, "(chkDimTrue) on first"));
   ASSERT_EQ(Run({"set", "display", "chkPatternContourPitch", "on"}).code, kExitOk);
   ASSERT_EQ(Run({"set", "display", "cmbPatternContourPitch", "3"}).code, kExitOk);
   EXPECT_EQ(Run({"get", "display", "cmbPatternContourPitch"}).out, "Weight 3\n");
@@ -606,14 +517,9 @@ TEST_F(AppCli, DisplayColoursAreTypedAsNumbersHexOrLines) {
 
 TEST_F(AppCli, NewerDialogsOpenAndEndEveryWayLeavingThePageOperable) {
   for (const char* page : {"annotation", "callouts"})
-    for (const char* action : {"accept", "cancel", "reject"}) {
-      Result r = Run({"set", page, "pushLegendTableLayout", action});
-      ASSERT_EQ(r.code, kExitOk) << page << " " << action << r.err;
-      EXPECT_NE(r.out.find(" and closed"), std::string::npos) << r.out;
-    }
-  Result lists = Run({"set", "annotation", "pushTableSortCustomLists", "accept"});
-  ASSERT_EQ(lists.code, kExitOk) << lists.err;
-  EXPECT_NE(lists.out.find("\"Months\""), std::string::npos) << lists.out;
+    for (const char* action : {"accept", "cancel", "reject"})
+      EXPECT_TRUE(Says(Run({"set", page, "pushLegendTableLayout", action}), kExitOk, " and closed")) << page;
+  EXPECT_TRUE(Says(Run({"set", "annotation", "pushTableSortCustomLists", "accept"}), kExitOk, "\"Months\""));
   EXPECT_EQ(Run({"set", "annotation", "pushTableSortCustomLists", "open"}).code, kExitOk);
   EXPECT_EQ(Run({"set", "annotation", "pushTableSortCustomLists", "press"}).code, kExitBadValue);
   EXPECT_EQ(Run({"set", "callouts", "pushTableSortCustomLists", "open"}).code, kExitUsage);
@@ -646,8 +552,7 @@ TEST_F(AppCli, EveryKeyFormNamesTheSameSetting) {
 
 TEST_F(AppCli, AdministratorLocksAtAValueAndSetsDefaultsWithoutCodes) {
   ASSERT_EQ(Run({"set", "general", "cmbPaperLengthUnit", "cm"}).code, kExitOk);
-  Result lock = Run({"lock", "general", "cmbPaperLengthUnit", "inch"});
-  ASSERT_EQ(lock.code, kExitOk) << lock.err;
+  ASSERT_TRUE(Says(Run({"lock", "general", "cmbPaperLengthUnit", "inch"}), kExitOk, ""));
   const nlohmann::json admin = nlohmann::json::parse(ReadBytes(_admin));
   const nlohmann::json& entry = admin["settings"]["DraftingOptions"]["DrwPaperLengthUnit"];
   EXPECT_EQ(entry["int"], 5);
@@ -687,7 +592,7 @@ TEST_F(AppCli, JsonOutputsDescribeEverySetting) {
     if (c["control"] != "editorGridSpacingV") continue;
     sawDisabled = true;
     EXPECT_EQ(c["enabled"], false);
-    EXPECT_NE(c["whyNot"].get<std::string>().find("checkAllowDistortions"), std::string::npos);
+    EXPECT_TRUE(Has(c["whyNot"].get<std::string>(), "checkAllowDistortions"));
     EXPECT_EQ(c["attribute"], "Drw_settings_GridVPrimarySpacing");
     EXPECT_EQ(c["stored"].size(), 5u);
   }
@@ -716,9 +621,7 @@ TEST_F(AppCli, WhatGetPrintsSetsBackWithoutChange) {
         const std::string key = page.name + "." + c["control"].get<std::string>();
         const std::string value = Run({"get", key}).out;
         const std::string before = ReadBytes(_settings);
-        Result back = Run({"set", key, value.substr(0, value.size() - 1)});
-        EXPECT_EQ(back.code, kExitOk) << key << " " << value << back.err;
-        EXPECT_NE(back.out.find("(unchanged)"), std::string::npos) << key << " " << value;
+        EXPECT_TRUE(Says(Run({"set", key, value.substr(0, value.size() - 1)}), kExitOk, "(unchanged)")) << key;
         EXPECT_EQ(ReadBytes(_settings), before) << key;
         ++checked;
       }
@@ -733,13 +636,13 @@ TEST_F(AppCli, ScriptsCanTrustTheExitCode) {
   EXPECT_EQ(WEXITSTATUS(std::system((cmd + " > /dev/null").c_str())), kExitOk);
   // A completion script that bash reads, knowing the pages and the controls.
   const std::string script = Run({"completion", "bash"}).out;
-  EXPECT_NE(script.find("complete -F _drafting_options drafting-options"), std::string::npos);
-  EXPECT_NE(script.find("general.checkViewFrame"), std::string::npos);
+  EXPECT_TRUE(Has(script, "complete -F _drafting_options drafting-options"));
+  EXPECT_TRUE(Has(script, "general.checkViewFrame"));
   std::ofstream(_dir / "completion.bash") << script;
   EXPECT_EQ(std::system(("bash -n '" + (_dir / "completion.bash").string() + "'").c_str()), 0);
   // Each command's help has examples; the program's help the exit codes.
-  EXPECT_NE(Run({"set", "--help"}).out.find("Examples:"), std::string::npos);
-  EXPECT_NE(Run({"--help"}).out.find("Exit codes:"), std::string::npos);
+  EXPECT_TRUE(Has(Run({"set", "--help"}).out, "Examples:"));
+  EXPECT_TRUE(Has(Run({"--help"}).out, "Exit codes:"));
 }
 
 TEST_F(AppCli, RenderedDialogExplainsGreyControlsAndOpensTheAskedTab) {
@@ -751,16 +654,16 @@ TEST_F(AppCli, RenderedDialogExplainsGreyControlsAndOpensTheAskedTab) {
       << "locked control without its reason";
   EXPECT_TRUE(std::regex_search(
       html, std::regex("data-name=\"editorGridSpacingV_dialog\" title=\"[^\"]*turn &quot;Allow distortions&quot;")));
-  EXPECT_NE(html.find("<span class=\"label\">Scale range:</span>"), std::string::npos);
-  EXPECT_NE(html.find("1\xE2\x80\xAF" "000\xE2\x80\xAF" "000 mm"), std::string::npos); // grouped for reading
-  EXPECT_NE(html.find(".panels .page:target"), std::string::npos);                   // #page-NAME opens it
-  EXPECT_NE(html.find("overflow:auto"), std::string::npos);                          // scrolls when narrow
+  EXPECT_TRUE(Has(html, "<span class=\"label\">Scale range:</span>"));
+  EXPECT_TRUE(Has(html, "1\xE2\x80\xAF" "000\xE2\x80\xAF" "000 mm")); // grouped for reading
+  EXPECT_TRUE(Has(html, ".panels .page:target"));                   // #page-NAME opens it
+  EXPECT_TRUE(Has(html, "overflow:auto"));                          // scrolls when narrow
   // Without its catalogs the program stops at once rather than drawing a dialog without texts.
   setenv("ZEP_RESOURCES", (_dir / "nowhere").c_str(), 1);
   Result missing = Run({"render", "--html", "-"});
   unsetenv("ZEP_RESOURCES");
   EXPECT_EQ(missing.code, kExitFailure);
-  EXPECT_NE(missing.err.find((_dir / "nowhere").string() + "/catalogs"), std::string::npos) << missing.err;
+  EXPECT_TRUE(Has(missing.err, (_dir / "nowhere").string() + "/catalogs"));
   EXPECT_TRUE(missing.out.empty());
 }
 
@@ -787,10 +690,8 @@ TEST_F(AppCli, MainPageStandardsSurviveEachSaveAndReload) {
   ASSERT_EQ(run({"set", "main", "cmbStandardName", "JIS"}).code, kExitOk);
   EXPECT_EQ(texts("DrwStandardName"), Texts{"JIS"});
   // Added through the chooser by name or key; the last one added is current.
-  for (const std::string& wanted : {societe, std::string("K-3"), std::string("K-2")}) {
-    Result added = run({"set", "main", "pusStandardPLMAdd", wanted});
-    ASSERT_EQ(added.code, kExitOk) << wanted << added.err;
-  }
+  for (const std::string& wanted : {societe, std::string("K-3"), std::string("K-2")})
+    ASSERT_EQ(run({"set", "main", "pusStandardPLMAdd", wanted}).code, kExitOk) << wanted;
   EXPECT_EQ(texts("DrwStandardPLMList"), (Texts{societe, "Twin", "Twin"}));
   EXPECT_EQ(texts("DrwStandardPLMIDList"), (Texts{"K-1", "K-3", "K-2"}));
   EXPECT_EQ(texts("DrwStandardName"), Texts{"K-2"});
@@ -809,11 +710,8 @@ TEST_F(AppCli, MainPageStandardsSurviveEachSaveAndReload) {
       {"pusStandardPLMRemove", "K-9", kExitBadValue, "Twin  (key K-2)"},
   };
   const std::string before = ReadBytes(_settings);
-  for (const auto& r : refused) {
-    Result result = run({"set", "main", r.control, r.value});
-    EXPECT_EQ(result.code, r.code) << r.value;
-    EXPECT_NE((result.err + result.out).find(r.told), std::string::npos) << r.value << ": " << result.err;
-  }
+  for (const auto& r : refused)
+    EXPECT_TRUE(Says(run({"set", "main", r.control, r.value}), r.code, r.told)) << r.value;
   EXPECT_EQ(ReadBytes(_settings), before);
 
   // Two standards of one name: each line is its own, by its key.
@@ -875,16 +773,11 @@ TEST_F(AppCli, ScaleRatiosPerRangeAndTheTitleBlockFolder) {
   for (const auto& r : refused) {
     std::vector<std::string> args = {"set", "main", "edtScaleRatio"};
     args.insert(args.end(), r.args.begin(), r.args.end());
-    Result result = Run(args);
-    EXPECT_EQ(result.code, kExitBadValue) << r.args[0];
-    EXPECT_NE(result.err.find(r.told), std::string::npos) << r.args[0] << ": " << result.err;
+    EXPECT_TRUE(Says(Run(args), kExitBadValue, r.told));
   }
-  Result decimal = Run({"set", "main", "edtScaleRatioDec", "3"});
-  EXPECT_EQ(decimal.code, kExitRefused);
-  EXPECT_NE(decimal.err.find("set edtScaleRatio instead"), std::string::npos) << decimal.err;
-  Result shareable = Run({"set", "main", "chkMakeDrawingShareable", "on"});
-  EXPECT_EQ(shareable.code, kExitRefused);
-  EXPECT_NE(shareable.err.find("(chkInsertDrawing) on first"), std::string::npos);
+  EXPECT_TRUE(Says(Run({"set", "main", "edtScaleRatioDec", "3"}), kExitRefused, "set edtScaleRatio instead"));
+  EXPECT_TRUE(Says(Run({"set", "main", "chkMakeDrawingShareable", "on"}), kExitRefused,
+                   "(chkInsertDrawing) on first"));
 
   // The folder: a text kept as typed; a folder this computer lacks is only warned about.
   const std::string folder = (_dir / "Cartouches \xC3\xA9t\xC3\xA9").string();
@@ -893,15 +786,12 @@ TEST_F(AppCli, ScaleRatiosPerRangeAndTheTitleBlockFolder) {
   ASSERT_EQ(set.code, kExitOk) << set.err;
   EXPECT_TRUE(set.err.empty()) << set.err;
   EXPECT_EQ(Run({"get", "DrwFolderTitleBlock"}).out, folder + "\n");
-  Result missing = Run({"set", "administration", "FrameAndTitleBlockPath", "/no/such/folder"});
-  EXPECT_EQ(missing.code, kExitOk);
-  EXPECT_NE(missing.err.find("warning: there is no folder \"/no/such/folder\""), std::string::npos);
+  EXPECT_TRUE(Says(Run({"set", "administration", "FrameAndTitleBlockPath", "/no/such/folder"}), kExitOk,
+                   "warning: there is no folder \"/no/such/folder\""));
   EXPECT_EQ(nlohmann::json::parse(Run({"get", "DrwFolderTitleBlock", "--json"}).out)["stored"], "/no/such/folder");
   const std::string kept = ReadBytes(_settings);
-  for (const char* bad : {"", "  ", "bad \xC3", "two\nlines"}) {
-    Result r = Run({"set", "administration", "FrameAndTitleBlockPath", bad});
-    EXPECT_EQ(r.code, kExitBadValue) << bad;
-  }
+  for (const char* bad : {"", "  ", "bad \xC3", "two\nlines"})
+    EXPECT_EQ(Run({"set", "administration", "FrameAndTitleBlockPath", bad}).code, kExitBadValue) << bad;
   EXPECT_EQ(ReadBytes(_settings), kept);
   ASSERT_EQ(Run({"reset", "DrwFolderTitleBlock"}).code, kExitOk);
   EXPECT_EQ(Run({"get", "DrwFolderTitleBlock"}).out, "\n");
@@ -921,11 +811,10 @@ TEST_F(AppCli, StandardsFolderAndAFaultyPLMRepository) {
   ASSERT_EQ(chosen.code, kExitOk) << chosen.err;
   EXPECT_EQ(chosen.out, "Drafting standard: Yard\n");
   // Among the samples "Yard" is no choice: shown as an extra first line, the others after it.
-  EXPECT_NE(Run({"set", "main", "cmbStandardName", "1"}).out.find("Yard (not offered) (unchanged)"), std::string::npos);
+  EXPECT_TRUE(Has(Run({"set", "main", "cmbStandardName", "1"}).out, "Yard (not offered) (unchanged)"));
   EXPECT_EQ(Run({"set", "main", "cmbStandardName", "2"}).out, "Drafting standard: ANSI\n");
-  Result missing = Run({"--standards", (_dir / "none").string(), "get", "main", "cmbStandardName"});
-  EXPECT_EQ(missing.code, kExitOk);
-  EXPECT_NE(missing.err.find("no folder standard is offered"), std::string::npos) << missing.err;
+  EXPECT_TRUE(Says(Run({"--standards", (_dir / "none").string(), "get", "main", "cmbStandardName"}), kExitOk,
+                   "no folder standard is offered"));
 
   // A repository file the chooser cannot use: said where, and nothing is written.
   const std::string plm = (_dir / "plm.json").string();
@@ -944,9 +833,8 @@ TEST_F(AppCli, StandardsFolderAndAFaultyPLMRepository) {
   };
   for (const auto& f : faulty) {
     std::ofstream(plm, std::ios::binary | std::ios::trunc) << f.text;
-    Result r = Run({"--plm-repository", plm, "set", "main", "pusStandardPLMAdd", "A"});
-    EXPECT_EQ(r.code, kExitFile) << f.text;
-    EXPECT_NE(r.err.find(plm + f.told), std::string::npos) << r.err;
+    EXPECT_TRUE(Says(Run({"--plm-repository", plm, "set", "main", "pusStandardPLMAdd", "A"}), kExitFile,
+                     plm + f.told));
   }
   EXPECT_EQ(Run({"--plm-repository", _dir.string(), "set", "main", "pusStandardPLMAdd", "A"}).code, kExitFile);
   EXPECT_EQ(ReadBytes(_settings), before);
@@ -954,21 +842,19 @@ TEST_F(AppCli, StandardsFolderAndAFaultyPLMRepository) {
   std::ofstream(_settings, std::ios::trunc)
       << R"({"settings": {"DraftingOptions": {"DrwStandardPLMList": {"text": ["A", "B"]},
                                                "DrwStandardPLMIDList": {"text": "k"}}}})";
-  EXPECT_NE(Run({"get", "main", "cmbStandardName"}).err.find("holds 2 names and DrwStandardPLMIDList 1 keys"),
-            std::string::npos);
+  EXPECT_TRUE(Has(Run({"get", "main", "cmbStandardName"}).err, "holds 2 names and DrwStandardPLMIDList 1 keys"));
   // The standard's name is one text, not a list.
   std::ofstream(_settings, std::ios::trunc)
       << R"({"settings": {"DraftingOptions": {"DrwStandardName": {"text": ["JIS", "ANSI"]}}}})";
   Result two = Run({"get", "main", "cmbStandardName"});
   EXPECT_EQ(two.out, "ISO\n");
-  EXPECT_NE(two.err.find("holds 2 values, expected 1"), std::string::npos) << two.err;
+  EXPECT_TRUE(Has(two.err, "holds 2 values, expected 1"));
   fs::remove(_settings);
   // The shipped sample is found like the catalogs, and lists the standards the chooser offers.
-  Result sample = Run({"set", "main", "pusStandardPLMAdd", "Supplier drafting standard"});
-  EXPECT_EQ(sample.code, kExitOk) << sample.err;
+  EXPECT_TRUE(Says(Run({"set", "main", "pusStandardPLMAdd", "Supplier drafting standard"}), kExitOk, ""));
   // The rendered combo tells PLM lines from folder lines.
   const std::string html = Run({"render", "--html", "-", "main"}).out;
-  EXPECT_NE(html.find("data-icon=\"I_D3M_Database\""), std::string::npos);
-  EXPECT_NE(html.find("ISO (standard file)"), std::string::npos);
-  EXPECT_NE(html.find("Supplier drafting standard (PLM standard)"), std::string::npos);
+  EXPECT_TRUE(Has(html, "data-icon=\"I_D3M_Database\""));
+  EXPECT_TRUE(Has(html, "ISO (standard file)"));
+  EXPECT_TRUE(Has(html, "Supplier drafting standard (PLM standard)"));
 }

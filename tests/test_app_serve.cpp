@@ -104,12 +104,12 @@ TEST_F(ServeTest, EveryRequestNeedsTheTokenAndTheLoopbackHost) {
   httplib::Result page = bare.Get(("/?token=" + _pServer->Token()).c_str());
   ASSERT_EQ(page->status, 200);
   // The dialog render draws, its controls marked for the script, which the policy alone runs.
-  EXPECT_NE(page->body.find("id=\"page-grid\""), std::string::npos);
-  EXPECT_NE(page->body.find("data-control=\"checkAllowDistortions\""), std::string::npos);
+  EXPECT_TRUE(Has(page->body, "id=\"page-grid\""));
+  EXPECT_TRUE(Has(page->body, "data-control=\"checkAllowDistortions\""));
   const std::string policy = page->get_header_value("Content-Security-Policy");
   const std::size_t nonce = policy.find("'nonce-");
   ASSERT_NE(nonce, std::string::npos) << policy;
-  EXPECT_NE(page->body.find("<script nonce=\"" + policy.substr(nonce + 7, 32) + "\">"), std::string::npos);
+  EXPECT_TRUE(Has(page->body, "<script nonce=\"" + policy.substr(nonce + 7, 32) + "\">"));
   // Only its own page and API: nothing else, and no way to the file system.
   EXPECT_EQ(Client().Get("/../../etc/passwd")->status, 404);
   EXPECT_EQ(Client().Get(("/" + _user.filename().string()).c_str())->status, 404);
@@ -121,8 +121,7 @@ TEST_F(ServeTest, EveryRequestNeedsTheTokenAndTheLoopbackHost) {
 TEST_F(ServeTest, ChangeIsSavedAndTheWholeStateFollows) {
   const nlohmann::json before = State();
   EXPECT_FALSE(Control(before, "grid", "editorGridSpacingV")["enabled"]);
-  EXPECT_NE(Control(before, "grid", "editorGridSpacingV")["whyNot"].get<std::string>().find("checkAllowDistortions"),
-            std::string::npos);
+  EXPECT_TRUE(Has(Control(before, "grid", "editorGridSpacingV")["whyNot"].get<std::string>(), "checkAllowDistortions"));
 
   const nlohmann::json answer = Change("grid", "checkAllowDistortions", "on");
   EXPECT_TRUE(answer["ok"]) << answer["message"];
@@ -134,15 +133,14 @@ TEST_F(ServeTest, ChangeIsSavedAndTheWholeStateFollows) {
     EXPECT_TRUE(Control(state, page, "editorGridSpacingV")["enabled"]) << page;
     EXPECT_EQ(Control(state, page, "editorGridSpacingV")["whyNot"], "") << page;
   }
-  EXPECT_NE(Page(state, "grid")["html"].get<std::string>().find("class=\"check on\" data-name=\"checkAllowDistortions_dialog\""),
-            std::string::npos);
+  EXPECT_TRUE(Has(Page(state, "grid")["html"].get<std::string>(), "class=\"check on\" data-name=\"checkAllowDistortions_dialog\""));
 
   // A value the control does not take: said, nothing written.
   const std::string saved = ReadBytes(_user);
   const nlohmann::json bad = Change("grid", "editorGridSpacing", "wide");
   EXPECT_FALSE(bad["ok"]);
   EXPECT_EQ(bad["code"], kExitBadValue);
-  EXPECT_NE(bad["message"].get<std::string>().find("not a number"), std::string::npos);
+  EXPECT_TRUE(Has(bad["message"].get<std::string>(), "not a number"));
   EXPECT_EQ(ReadBytes(_user), saved);
 
   // The scale range combo switches the range shown; a change then goes to that range.
@@ -164,8 +162,8 @@ TEST_F(ServeTest, LockedControlIsRefusedWithWhoAndWhere) {
   EXPECT_FALSE(answer["ok"]);
   EXPECT_EQ(answer["code"], kExitRefused);
   const std::string message = answer["message"];
-  EXPECT_NE(message.find("cad-admin"), std::string::npos) << message;
-  EXPECT_NE(message.find(_admin.string()), std::string::npos) << message;
+  EXPECT_TRUE(Has(message, "cad-admin"));
+  EXPECT_TRUE(Has(message, _admin.string()));
   EXPECT_EQ(Control(answer["state"], "grid", "checkSnap")["shown"], "on"); // back to the stored value
   EXPECT_FALSE(fs::exists(_user));
 
@@ -173,7 +171,7 @@ TEST_F(ServeTest, LockedControlIsRefusedWithWhoAndWhere) {
   WriteBytes(_admin, "{\"format\": 1, \"settings\": ");
   const nlohmann::json faulty = Change("grid", "checkGrid", "off");
   EXPECT_EQ(faulty["code"], kExitFile);
-  EXPECT_NE(faulty["message"].get<std::string>().find(_admin.string() + ":"), std::string::npos) << faulty["message"];
+  EXPECT_TRUE(Has(faulty["message"].get<std::string>(), _admin.string() + ":"));
   EXPECT_EQ(faulty["state"]["errors"].size(), 1u);
   EXPECT_FALSE(fs::exists(_user));
 }
@@ -183,23 +181,23 @@ TEST_F(ServeTest, SubDialogControlsAreSetAsOnTheirPage) {
   EXPECT_TRUE(answer["ok"]) << answer["message"];
   EXPECT_EQ(Stored("DraftingOptions", "DrwGeoCstVisuSym"), 0);
   EXPECT_TRUE(Control(answer["state"], "geometry", "checkCstVisuSym")["inDialog"]);
-  EXPECT_NE(Page(answer["state"], "geometry")["html"].get<std::string>().find("id=\"dlg-geometry-"), std::string::npos);
+  EXPECT_TRUE(Has(Page(answer["state"], "geometry")["html"].get<std::string>(), "id=\"dlg-geometry-"));
 
   // Without direct manipulation its dialog cannot be opened: its controls are refused with why.
   EXPECT_TRUE(Change("geometry", "checkGeomDrag", "off")["ok"]);
   const nlohmann::json refused = Change("geometry", "dragOptionPushButton", "open");
   EXPECT_EQ(refused["code"], kExitRefused);
-  EXPECT_NE(refused["message"].get<std::string>().find("checkGeomDrag"), std::string::npos) << refused["message"];
+  EXPECT_TRUE(Has(refused["message"].get<std::string>(), "checkGeomDrag"));
   // A dialog of the newer framework: opened, said, and closed again with its session.
   for (const char* button : {"pushLegendTableLayout", "pushTableSortCustomLists"}) {
     const nlohmann::json opened = Change("annotation", button, "open");
-    EXPECT_NE(opened["message"].get<std::string>().find("the dialog opened"), std::string::npos) << opened["message"];
+    EXPECT_TRUE(Has(opened["message"].get<std::string>(), "the dialog opened"));
   }
   EXPECT_TRUE(ZEPVidFraWindow::Windows().empty()); // the server is idle between requests
 
   const nlohmann::json hidden =
       Post("/api/change", R"({"page":"geometry","control":"checkDragWithEndPts","value":"off"})", 400);
-  EXPECT_NE(hidden.value("error", "").find("unknown control"), std::string::npos); // its dialog is not open
+  EXPECT_TRUE(Has(hidden.value("error", ""), "unknown control")); // its dialog is not open
 }
 
 TEST_F(ServeTest, TwoClientsChangingAtOnceLoseNothing) {
@@ -231,16 +229,13 @@ TEST_F(ServeTest, ChangesMadeElsewhereMoveTheStampAndShow) {
 
 TEST_F(ServeTest, MalformedAndOversizedBodiesAreRefused) {
   auto error = [](const nlohmann::json& j) { return j.value("error", std::string()); };
-  EXPECT_NE(error(Post("/api/change", "{\"page\": ", 400)).find("not valid JSON"), std::string::npos);
-  EXPECT_NE(error(Post("/api/change", "[1, 2]", 400)).find("JSON object"), std::string::npos);
-  EXPECT_NE(error(Post("/api/change", R"({"page":"grid","control":"checkSnap"})", 400)).find("\"value\" is missing"),
-            std::string::npos);
-  EXPECT_NE(error(Post("/api/change", R"({"page":"grid","control":"checkSnap","value":{}})", 400)).find("\"value\""),
-            std::string::npos);
-  EXPECT_NE(error(Post("/api/change", R"({"page":"gird","control":"checkSnap","value":"on"})", 400)).find("grid"),
-            std::string::npos);
-  EXPECT_NE(error(Post("/api/state", R"({"ranges":{"grid":7}})", 400)).find("1 to 5"), std::string::npos);
-  EXPECT_NE(error(Post("/api/change", std::string(kServeMaxBody + 1, ' '), 413)).find("KiB"), std::string::npos);
+  EXPECT_TRUE(Has(error(Post("/api/change", "{\"page\": ", 400)), "not valid JSON"));
+  EXPECT_TRUE(Has(error(Post("/api/change", "[1, 2]", 400)), "JSON object"));
+  EXPECT_TRUE(Has(error(Post("/api/change", R"({"page":"grid","control":"checkSnap"})", 400)), "\"value\" is missing"));
+  EXPECT_TRUE(Has(error(Post("/api/change", R"({"page":"grid","control":"checkSnap","value":{}})", 400)), "\"value\""));
+  EXPECT_TRUE(Has(error(Post("/api/change", R"({"page":"gird","control":"checkSnap","value":"on"})", 400)), "grid"));
+  EXPECT_TRUE(Has(error(Post("/api/state", R"({"ranges":{"grid":7}})", 400)), "1 to 5"));
+  EXPECT_TRUE(Has(error(Post("/api/change", std::string(kServeMaxBody + 1, ' '), 413)), "KiB"));
   // Deep nesting within the bound: answered, and the server goes on.
   const std::string deep = std::string(30000, '[') + std::string(30000, ']');
   Post("/api/change", deep, 400);
@@ -306,7 +301,7 @@ TEST_F(SettingsFolderTest, ServeCommandPrintsItsAddressAndStopsOnSigterm) {
     printed.append(buffer, static_cast<std::size_t>(n));
   }
   close(out[0]);
-  EXPECT_NE(printed.find("Stopped."), std::string::npos);
+  EXPECT_TRUE(Has(printed, "Stopped."));
   EXPECT_EQ(nlohmann::json::parse(ReadBytes(_user))["settings"]["DrwSketcherSpecific"]["Drw_settings_GridSnapPt"]["int"], 0);
 }
 

@@ -26,39 +26,10 @@ const char* const kStates[] = {"AnnotDelGeom",
                                "DrwWeldNotUpToDate"};
 const char* const kDiagColors[] = {"OverConsElts", "InconsElts", "NotChanElts", "IsoConsElts"};
 
-class DisplayPage : public ZEPHostTest {
+class DisplayPage : public PageTest<RecordingDisplayPage> {
 protected:
-  void SetUp() override {
-    ZEPHostTest::SetUp();
-    ZEPSysSettingRepository::Open("DraftingOptions");
-  }
-  void Open() { _pPage = OpenPage<RecordingDisplayPage>(_script, &_root); }
-  // Opens the page on a window of its own, which the caller deletes.
-  ZEPDlgWindow* OpenOnWindow() {
-    auto* window = new ZEPDlgWindow(&_root, "window", 0);
-    _pPage = OpenPage<RecordingDisplayPage>(_script, window);
-    return window;
-  }
-  ZEPDialog* Find(const std::string& iName) { return ZEPDlgDriver::Find(_pPage, iName); }
-  ZEPDialog* Control(const std::string& iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
-  ZEPDlgDialog* OpenDialog(const char* iButton, const char* iDialog) {
-    EXPECT_TRUE(ZEPDlgDriver::Click(Control(iButton))) << iButton;
-    return ZEPSysDynamicCast<ZEPDlgDialog>(Find(iDialog));
-  }
-  ZEPDlgDialog* AnalysisDialog() {
-    return OpenDialog("diagElementsColorsPushButton", "dlgAnalysisDisplay");
-  }
-  ZEPDlgDialog* DiagDialog() {
-    return OpenDialog("diagGeometriesColorsPushButton", "dlgVisuDiagColor");
-  }
-  bool Checked(const std::string& iName) {
-    auto* check = ZEPSysDynamicCast<ZEPDlgCheckButton>(Control(iName));
-    auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(Control(iName));
-    return check ? check->GetState() == ZEPDlgChecked : radio->GetState() == ZEPDlgChecked;
-  }
-  std::vector<std::string> Hooks() { return _script.Hooks(); }
-  HookScript _script;
-  RecordingDisplayPage* _pPage = nullptr;
+  ZEPDlgDialog* AnalysisDialog() { return OpenDialog("diagElementsColorsPushButton", "dlgAnalysisDisplay"); }
+  ZEPDlgDialog* DiagDialog() { return OpenDialog("diagGeometriesColorsPushButton", "dlgVisuDiagColor"); }
 };
 } // namespace
 
@@ -108,11 +79,10 @@ TEST_F(DisplayPage, EachPredicateDecidesItsFrame) {
   for (const auto& c : cases)
     for (long with : {0, 1}) {
       _script.options = {{c.predicate, with}};
-      ZEPDlgWindow* window = OpenOnWindow();
+      Open();
       if (c.inDialog) AnalysisDialog();
       EXPECT_EQ(Find(c.frame) != nullptr, with == 1) << c.predicate;
       EXPECT_EQ(_pPage->nextRow, c.inDialog || with ? 4 : 3) << c.predicate;
-      delete window;
     }
   // Without the capping frame its values are still read.
   _script.options = {{"WithFrmCapping", 0}, {"WithFrmVisualization", 0}, {"WithFrmPatterns", 0}};
@@ -138,34 +108,30 @@ TEST_F(DisplayPage, OptionalControlsNeedExactlyZero) {
     for (long status : {0L, 1L, E_NOTIMPL}) {
       _script.info = {{c.attribute, status}, {"VisuDiagnostic", 0}};
       _script.values = {{"DimAnalysisDisplay", {1}}, {"VisuDiagnostic", {1}}};
-      ZEPDlgWindow* window = OpenOnWindow();
-      if (c.button && Control(c.button)) ZEPDlgDriver::Click(Control(c.button));
+      Open();
+      if (c.button && Control(c.button)) Click(c.button);
       EXPECT_EQ(Find(c.control) != nullptr, status == 0) << c.control << " " << status;
-      delete window;
     }
   // Without the flag of the caller the track history check is never built.
   _script.info = {{"TrackHistory", 0}};
   _script.options = {{"WithTrackHistory", 0}};
   Open();
   EXPECT_EQ(Find("checkTrackHistory"), nullptr);
-  EXPECT_EQ(Find("labelDisplay")->GetGridConstraints().row, 0);
+  EXPECT_EQ(Row("labelDisplay"), 0);
 }
 
 TEST_F(DisplayPage, TreeRowsStayCompact) {
   _script.info = {{"Relations", 0}, {"HideIn3DStatus", 0}, {"Ditto", 0}};
   Open();
-  EXPECT_EQ(Find("checkRelations")->GetGridConstraints().row,
-            Find("invLock")->GetGridConstraints().row);
+  EXPECT_EQ(Row("checkRelations"), Row("invLock"));
   const ZEPDialog::Cell& hide = Find("checkHideIn3DStatus")->GetGridConstraints();
-  EXPECT_EQ(hide.row, Find("checkRelations")->GetGridConstraints().row);
+  EXPECT_EQ(hide.row, Row("checkRelations"));
   EXPECT_EQ(hide.column, 3);
-  EXPECT_EQ(Find("checkDitto")->GetGridConstraints().row, hide.row + 1);
+  EXPECT_EQ(Row("checkDitto"), hide.row + 1);
   // Nothing before it: the row of "labelDisplay".
   _script.info = {{"HideIn3DStatus", 0}};
-  ZEPDlgWindow* window = OpenOnWindow();
-  EXPECT_EQ(Find("checkHideIn3DStatus")->GetGridConstraints().row,
-            Find("labelDisplay")->GetGridConstraints().row);
-  delete window;
+  Open();
+  EXPECT_EQ(Row("checkHideIn3DStatus"), Row("labelDisplay"));
 }
 
 TEST_F(DisplayPage, PageChecksAndTheirDependants) {
@@ -181,9 +147,9 @@ TEST_F(DisplayPage, PageChecksAndTheirDependants) {
                {"chkBackgroundInViewFrame", "radBackgroundInViewFrameDemand"}};
   for (const auto& c : cases) {
     const bool on = Checked(c.check);
-    EXPECT_EQ(Control(c.dependant)->IsEffectivelyEnabled(), on) << c.dependant;
-    ASSERT_TRUE(ZEPDlgDriver::Click(Control(c.check)));
-    EXPECT_EQ(Control(c.dependant)->IsEffectivelyEnabled(), !on) << c.dependant;
+    EXPECT_EQ(Enabled(c.dependant), on) << c.dependant;
+    ASSERT_TRUE(Click(c.check));
+    EXPECT_EQ(Enabled(c.dependant), !on) << c.dependant;
   }
   EXPECT_TRUE(Checked("checkAnnotInSpecTreeAnnotSet")) << "disabled, its value kept";
   EXPECT_EQ(Hooks(),
@@ -206,15 +172,15 @@ TEST_F(DisplayPage, RadioPairsShowTheirValueAndWriteOncePerChange) {
     for (double stored : {0.0, 1.0, 2.0, 7.0}) {
       _script.values = {{"BackgroundInViewFrame", {1}}, {c.attribute, {stored}}};
       _script.calls.clear();
-      ZEPDlgWindow* window = OpenOnWindow();
+      Open();
       const bool second = stored == c.shownSecond;
       EXPECT_EQ(Checked(c.second), second) << c.attribute << stored;
       EXPECT_EQ(Checked(c.first), !second) << c.attribute << stored;
       // Click the other radio, the one already on, and back: two writes.
       const char* other = second ? c.first : c.second;
-      ASSERT_TRUE(ZEPDlgDriver::Click(Control(other)));
-      ASSERT_TRUE(ZEPDlgDriver::Click(Control(other)));
-      ASSERT_TRUE(ZEPDlgDriver::Click(Control(second ? c.second : c.first)));
+      ASSERT_TRUE(Click(other));
+      ASSERT_TRUE(Click(other));
+      ASSERT_TRUE(Click(second ? c.second : c.first));
       std::vector<double> written;
       for (const HookCall& call : _script.calls)
         written.push_back(call.values[0]);
@@ -225,7 +191,6 @@ TEST_F(DisplayPage, RadioPairsShowTheirValueAndWriteOncePerChange) {
         EXPECT_EQ(written, std::vector<double>{back}) << c.attribute << stored;
       else
         EXPECT_EQ(written, (std::vector<double>{toOther, back})) << c.attribute << stored;
-      delete window;
     }
 }
 
@@ -235,11 +200,11 @@ TEST_F(DisplayPage, CappingColourFollowsTheBackgroundRadiosAndBothPadlocks) {
   Open();
   // A stored 2 shows the fixed colour radio, its combo disabled.
   EXPECT_TRUE(Checked("radCappingColorFix"));
-  EXPECT_FALSE(Control("cmbCappingColor")->IsEffectivelyEnabled());
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("radCappingColorFromFace")));
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("radCappingColorFix")));
-  EXPECT_TRUE(Control("cmbCappingColor")->IsEffectivelyEnabled());
-  EXPECT_TRUE(Control("chkCappingColorScale")->IsEffectivelyEnabled());
+  EXPECT_FALSE(Enabled("cmbCappingColor"));
+  ASSERT_TRUE(Click("radCappingColorFromFace"));
+  ASSERT_TRUE(Click("radCappingColorFix"));
+  EXPECT_TRUE(Enabled("cmbCappingColor"));
+  EXPECT_TRUE(Enabled("chkCappingColorScale"));
   ASSERT_TRUE(ZEPDlgDriver::SelectColor(Control("cmbCappingColor"), 10, 20, 30));
   ASSERT_EQ(Hooks(), (std::vector<std::string>{"SetSysCappingBackground", "SetSysCappingBackground",
                                                "SetSysCappingColor"}));
@@ -248,12 +213,11 @@ TEST_F(DisplayPage, CappingColourFollowsTheBackgroundRadiosAndBothPadlocks) {
   for (const char* lock : {"CappingBackground", "CappingColor"}) {
     _script.locked = {lock};
     _script.values = {{"CappingBackground", {0}}};
-    ZEPDlgWindow* window = OpenOnWindow();
-    EXPECT_FALSE(Control("cmbCappingColor")->IsEffectivelyEnabled()) << lock;
-    EXPECT_EQ(Control("chkCappingColorScale")->IsEffectivelyEnabled(),
+    Open();
+    EXPECT_FALSE(Enabled("cmbCappingColor")) << lock;
+    EXPECT_EQ(Enabled("chkCappingColorScale"),
               std::string(lock) == "CappingColor")
         << lock;
-    delete window;
   }
 }
 
@@ -266,9 +230,9 @@ TEST_F(DisplayPage, EveryAnalysedStateWritesThroughItsOwnHooks) {
   for (const char* state : kStates) {
     const std::string name = state;
     _script.calls.clear();
-    ZEPDialog* combo = ZEPDlgDriver::FindControl(dialog, "cmb" + name);
+    ZEPDialog* combo = Control("cmb" + name, dialog);
     EXPECT_FALSE(combo->IsEffectivelyEnabled()) << name << ": state off, colour disabled";
-    ASSERT_TRUE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(dialog, "chk" + name)));
+    ASSERT_TRUE(Click("chk" + name, dialog));
     EXPECT_TRUE(combo->IsEffectivelyEnabled()) << name;
     ASSERT_TRUE(ZEPDlgDriver::SelectColor(combo, 1, 2, 3));
     ASSERT_EQ(Hooks(), (std::vector<std::string>{"SetSys" + name, "SetSys" + name + "Color"}));
@@ -279,8 +243,7 @@ TEST_F(DisplayPage, EveryAnalysedStateWritesThroughItsOwnHooks) {
   ASSERT_TRUE(ZEPDlgDriver::CloseDialog(dialog));
   ZEPDlgDriver::Idle();
   dialog = AnalysisDialog();
-  EXPECT_TRUE(ZEPSysDynamicCast<ZEPDlgCheckButton>(ZEPDlgDriver::FindControl(dialog, "chkDimTrue"))
-                  ->GetState() == ZEPDlgChecked);
+  EXPECT_TRUE(Checked("chkDimTrue", dialog));
 }
 
 TEST_F(DisplayPage, StateRowsAreCompactInTheirFrame) {
@@ -288,11 +251,11 @@ TEST_F(DisplayPage, StateRowsAreCompactInTheirFrame) {
   _script.values = {{"DimAnalysisDisplay", {1}}};
   Open();
   ZEPDlgDialog* dialog = AnalysisDialog();
-  EXPECT_EQ(ZEPDlgDriver::Find(dialog, "chkDimDriving")->GetGridConstraints().row, 0);
-  EXPECT_EQ(ZEPDlgDriver::Find(dialog, "cmbDimTrue")->GetGridConstraints().row, 1);
-  EXPECT_EQ(ZEPDlgDriver::Find(dialog, "chkDimFake"), nullptr);
+  EXPECT_EQ(Row("chkDimDriving", dialog), 0);
+  EXPECT_EQ(Row("cmbDimTrue", dialog), 1);
+  EXPECT_EQ(Find("chkDimFake", dialog), nullptr);
   // The pattern controls need no answer.
-  EXPECT_NE(ZEPDlgDriver::Find(dialog, "chkPatternContourPitch"), nullptr);
+  EXPECT_NE(Find("chkPatternContourPitch", dialog), nullptr);
 }
 
 TEST_F(DisplayPage, PatternPitchWeightAndDiagnosisColours) {
@@ -304,23 +267,22 @@ TEST_F(DisplayPage, PatternPitchWeightAndDiagnosisColours) {
                     {"InconsElts", {4294967295.0, 0, 0}}};
   Open();
   ZEPDlgDialog* analysis = AnalysisDialog();
-  auto* weight = ZEPDlgDriver::FindControl(analysis, "cmbPatternContourPitch");
+  auto* weight = Control("cmbPatternContourPitch", analysis);
   EXPECT_EQ(ZEPSysDynamicCast<ZEPComboWeight>(weight)->GetSelect(), 3u);
   EXPECT_FALSE(weight->IsEffectivelyEnabled());
-  ASSERT_TRUE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(analysis, "chkPatternContourPitch")));
+  ASSERT_TRUE(Click("chkPatternContourPitch", analysis));
   ASSERT_TRUE(ZEPDlgDriver::Select(weight, 4));
   ZEPDlgDialog* diag = DiagDialog();
   unsigned int rgb[3] = {0, 0, 0};
-  ZEPSysDynamicCast<ZEPComboColor>(ZEPDlgDriver::FindControl(diag, "cmbOverConsElts"))
+  ZEPSysDynamicCast<ZEPComboColor>(Control("cmbOverConsElts", diag))
       ->GetSelectedColor(&rgb[0], &rgb[1], &rgb[2]);
   EXPECT_EQ(std::vector<unsigned int>(rgb, rgb + 3), (std::vector<unsigned int>{200, 100, 50}));
   // A colour out of range is not shown: no conversion wraps it into one.
-  ZEPSysDynamicCast<ZEPComboColor>(ZEPDlgDriver::FindControl(diag, "cmbInconsElts"))
+  ZEPSysDynamicCast<ZEPComboColor>(Control("cmbInconsElts", diag))
       ->GetSelectedColor(&rgb[0], &rgb[1], &rgb[2]);
   EXPECT_NE(std::vector<unsigned int>(rgb, rgb + 3), (std::vector<unsigned int>{255, 0, 0}));
   for (const char* name : kDiagColors)
-    ASSERT_TRUE(ZEPDlgDriver::SelectColor(
-        ZEPDlgDriver::FindControl(diag, std::string("cmb") + name), 255, 128, 0));
+    ASSERT_TRUE(ZEPDlgDriver::SelectColor(Control(std::string("cmb") + name, diag), 255, 128, 0));
   ASSERT_EQ(_script.calls.size(), 6u);
   EXPECT_EQ(_script.calls[1].hook, "SetSysPatternContourPitchThickness");
   EXPECT_EQ(_script.calls[1].values[0], 5.0);
@@ -344,16 +306,14 @@ TEST_F(DisplayPage, DialogsOpenOnceAndLocksHoldInside) {
     dialogs += ZEPSysDynamicCast<ZEPDlgDialog>(child) ? 1 : 0;
   EXPECT_EQ(dialogs, 1);
   // A locked state stays off-limits though ticked; its colour, not locked, follows the state.
-  EXPECT_FALSE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(analysis, "chkDimFake")));
-  EXPECT_TRUE(ZEPDlgDriver::FindControl(analysis, "cmbDimFake")->IsEffectivelyEnabled());
-  EXPECT_FALSE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(analysis, "chkPatternContourPitch")));
+  EXPECT_FALSE(Click("chkDimFake", analysis));
+  EXPECT_TRUE(Enabled("cmbDimFake", analysis));
+  EXPECT_FALSE(Click("chkPatternContourPitch", analysis));
   ZEPDlgDialog* diag = DiagDialog();
-  EXPECT_FALSE(
-      ZEPDlgDriver::SelectColor(ZEPDlgDriver::FindControl(diag, "cmbIsoConsElts"), 1, 1, 1));
-  EXPECT_TRUE(
-      ZEPDlgDriver::SelectColor(ZEPDlgDriver::FindControl(diag, "cmbNotChanElts"), 1, 1, 1));
+  EXPECT_FALSE(ZEPDlgDriver::SelectColor(Control("cmbIsoConsElts", diag), 1, 1, 1));
+  EXPECT_TRUE(ZEPDlgDriver::SelectColor(Control("cmbNotChanElts", diag), 1, 1, 1));
   // Disabling the button leaves the open dialog open.
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkDesignMode")));
+  ASSERT_TRUE(Click("checkDesignMode"));
   EXPECT_TRUE(analysis->IsEffectivelyEnabled());
   EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysNotChanElts", "SetSysDimAnalysisDisplay"}));
   // Closing one dialog leaves the other.

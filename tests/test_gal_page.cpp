@@ -2,37 +2,21 @@
 #include "RecordingPages.h"
 
 namespace {
-class GalPage : public ZEPHostTest {
+class GalPage : public PageTest<RecordingGalPage> {
 protected:
-  void Open() { _pPage = OpenPage<RecordingGalPage>(_script, &_root); }
-  ZEPDlgCombo* UnitCombo() {
-    return ZEPSysDynamicCast<ZEPDlgCombo>(ZEPDlgDriver::FindControl(_pPage, "cmbPaperLengthUnit"));
-  }
   std::string SelectedUnit() {
     ZEPUnicodeString text;
-    UnitCombo()->GetLine(text, UnitCombo()->GetSelect());
+    Combo("cmbPaperLengthUnit")->GetLine(text, Combo("cmbPaperLengthUnit")->GetSelect());
     return text.str();
   }
-  HookScript _script;
-  RecordingGalPage* _pPage = nullptr;
 };
 } // namespace
 
-TEST_F(GalPage, ModuleHooksShowZerosAndMillimetres) {
+// What each control shows, with the module's hooks and with every info hook answering 0, is in
+// the dumps.
+TEST_F(GalPage, ModuleHooksAndAllInfoHooksAnsweringZero) {
   Open();
-  for (const char* name : {"chkCopyFirstSheetBckg", "checkViewFrame", "checkViewReferential", "checkViewRefZoom"})
-    EXPECT_EQ(ZEPSysDynamicCast<ZEPDlgCheckButton>(ZEPDlgDriver::FindControl(_pPage, name))->GetState(),
-              ZEPDlgUnchecked)
-        << name;
-  auto* axis = ZEPSysDynamicCast<ZEPDlgSpinner>(ZEPDlgDriver::FindControl(_pPage, "spinnerViewAxisSize"));
-  EXPECT_EQ(axis->GetValue(), 0.0);
-  EXPECT_EQ(UnitCombo()->GetLineCount(), 3);
-  EXPECT_EQ(SelectedUnit(), ZEPMsgCatalog::BuildMessage("ZEP2DBaseOptGalFrm", "mmUnit").str());
-  EXPECT_FALSE(SelectedUnit().empty()); // the catalog has the text
   ExpectGolden("gal_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
-}
-
-TEST_F(GalPage, AllInfoHooksAnsweringZero) {
   _script.allInfoSet = true;
   _script.values = {{"CopyFirstSheetBckg", {1}}, {"2DAxisZoom", {1}}, {"2DAxisLength", {25}}, {"PaperLengthUnit", {5}}};
   Open();
@@ -42,13 +26,12 @@ TEST_F(GalPage, AllInfoHooksAnsweringZero) {
 TEST_F(GalPage, AxisLengthInMillimetresAtTheHooks) {
   _script.values["2DAxisLength"] = {25.0};
   Open();
-  auto* axis = ZEPSysDynamicCast<ZEPDlgSpinner>(ZEPDlgDriver::FindControl(_pPage, "spinnerViewAxisSize"));
+  ZEPDlgSpinner* axis = Spinner("spinnerViewAxisSize");
   EXPECT_DOUBLE_EQ(axis->GetValue(), 0.025);
   EXPECT_EQ(axis->GetUnit(), 45); // the user's millimetres
   ASSERT_TRUE(ZEPDlgDriver::Enter(axis, 0.04));
-  ASSERT_EQ(_script.calls.size(), 1u);
-  EXPECT_EQ(_script.calls[0].hook, "SetSys2DAxisLength");
-  EXPECT_DOUBLE_EQ(_script.calls[0].values[0], 40.0);
+  EXPECT_EQ(Hooks(), std::vector<std::string>{"SetSys2DAxisLength"});
+  EXPECT_DOUBLE_EQ(_script.calls.at(0).values[0], 40.0);
 }
 
 TEST_F(GalPage, PaperUnitLinesAndCodes) {
@@ -58,25 +41,18 @@ TEST_F(GalPage, PaperUnitLinesAndCodes) {
   } cases[] = {{1, "mmUnit"}, {3, "cmUnit"}, {5, "inUnit"}, {2, "mmUnit"}, {4, "mmUnit"}, {-7, "mmUnit"}};
   for (const auto& c : cases) {
     _script.values["PaperLengthUnit"] = {double(c.stored)};
-    auto* window = new ZEPDlgWindow(&_root, "window", 0); // a fresh page each time
-    _pPage = OpenPage<RecordingGalPage>(_script, window);
+    Open();
     EXPECT_EQ(SelectedUnit(), ZEPMsgCatalog::BuildMessage("ZEP2DBaseOptGalFrm", c.key).str()) << c.stored;
-    delete window;
   }
   EXPECT_TRUE(_script.calls.empty());
   // The user picks each line in turn: 1, 3, 5 are written.
   Open();
-  for (int line : {1, 2, 0}) ASSERT_TRUE(ZEPDlgDriver::Select(UnitCombo(), line));
-  std::vector<double> written;
-  for (const HookCall& call : _script.Calls("SetSysPaperLengthUnit")) written.push_back(call.values[0]);
-  EXPECT_EQ(written, (std::vector<double>{3, 5, 1}));
-}
-
-TEST_F(GalPage, ReinitialisingKeepsThreeUnitLines) {
+  for (int line : {1, 2, 0}) ASSERT_TRUE(ZEPDlgDriver::Select(Combo("cmbPaperLengthUnit"), line));
+  EXPECT_EQ(Written("SetSysPaperLengthUnit"), (std::vector<double>{3, 5, 1}));
+  // Initialised again, it still has three lines.
   _script.values["PaperLengthUnit"] = {3};
-  Open();
   _pPage->Initialize();
   _pPage->Initialize();
-  EXPECT_EQ(UnitCombo()->GetLineCount(), 3);
-  EXPECT_EQ(UnitCombo()->GetSelect(), 1);
+  EXPECT_EQ(Combo("cmbPaperLengthUnit")->GetLineCount(), 3);
+  EXPECT_EQ(Combo("cmbPaperLengthUnit")->GetSelect(), 1);
 }

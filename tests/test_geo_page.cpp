@@ -3,36 +3,7 @@
 #include "RecordingPages.h"
 
 namespace {
-class GeoPage : public ZEPHostTest {
-protected:
-  // The host has the drafting options open: the paper length unit is read from them.
-  void SetUp() override {
-    ZEPHostTest::SetUp();
-    ZEPSysSettingRepository::Open("DraftingOptions");
-  }
-  void Open() { _pPage = OpenPage<RecordingGeoPage>(_script, &_root); }
-  ZEPDialog* Control(const char* iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
-  ZEPDlgCheckButton* CheckOf(const char* iName) {
-    return ZEPSysDynamicCast<ZEPDlgCheckButton>(Control(iName));
-  }
-  ZEPDlgRadioButton* Radio(const char* iName) {
-    return ZEPSysDynamicCast<ZEPDlgRadioButton>(Control(iName));
-  }
-  // Presses the push button and answers the dialog of that name it opened.
-  ZEPDlgDialog* OpenDialog(const char* iButton, const char* iDialog) {
-    EXPECT_TRUE(ZEPDlgDriver::Click(Control(iButton))) << iButton;
-    return ZEPSysDynamicCast<ZEPDlgDialog>(ZEPDlgDriver::Find(_pPage, iDialog));
-  }
-  int DialogsNamed(const char* iName) {
-    int n = 0;
-    for (ZEPDialog* child : _pPage->GetChildren())
-      n += child->GetOwnName() == iName ? 1 : 0;
-    return n;
-  }
-  std::vector<std::string> Hooks() { return _script.Hooks(); }
-  HookScript _script;
-  RecordingGeoPage* _pPage = nullptr;
-};
+using GeoPage = PageTest<RecordingGeoPage>;
 
 const char* const kDialogs[][2] = {{"dragOptionPushButton", "geoAllowGeomManip"},
                                    {"smartPickPushButton", "geoSmartPick"},
@@ -58,10 +29,10 @@ TEST_F(GeoPage, ModuleHooksShowZerosAndDisableTheDependants) {
 TEST_F(GeoPage, WithoutGridPageTheSectionsKeepTheirRows) {
   _script.options["CreateGridFrame"] = 0;
   Open();
-  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "GridPage"), nullptr);
-  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "frameCenter")->GetGridConstraints().row, 1);
-  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "frameDittoInv")->GetGridConstraints().row, 4);
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkCenter")));
+  EXPECT_EQ(Find("GridPage"), nullptr);
+  EXPECT_EQ(Row("frameCenter"), 1);
+  EXPECT_EQ(Row("frameDittoInv"), 4);
+  ASSERT_TRUE(Click("checkCenter"));
   EXPECT_EQ(Hooks(), std::vector<std::string>{"SetSysCreateGeomCenter"});
 }
 
@@ -79,8 +50,8 @@ TEST_F(GeoPage, AllInfoHooksAnsweringZeroAndEveryDialog) {
 
 TEST_F(GeoPage, EmbeddedGridPageWritesThroughTheSameHost) {
   Open();
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkGrid")));
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("DittoDrag")));
+  ASSERT_TRUE(Click("checkGrid"));
+  ASSERT_TRUE(Click("DittoDrag"));
   EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysDisplayGrid", "SetSysDittoPreventManip"}));
 }
 
@@ -88,16 +59,16 @@ TEST_F(GeoPage, DependantsFollowTheirCheckButtonsButLocksWin) {
   _script.allInfoSet = true;
   _script.locked = {"RefSizeCst"};
   Open();
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkGeomDrag")));
-  EXPECT_TRUE(Control("dragOptionPushButton")->IsEffectivelyEnabled());
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkCstVisu")));
-  EXPECT_TRUE(Control("comboCstColor")->IsEffectivelyEnabled());
-  EXPECT_TRUE(Control("cstTypesPushButton")->IsEffectivelyEnabled());
-  EXPECT_FALSE(Control("editorCstRefSize")->IsEffectivelyEnabled()); // locked
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkCstVisu")));
-  EXPECT_FALSE(Control("comboCstColor")->IsEffectivelyEnabled());
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkGeomDrag")));
-  EXPECT_FALSE(Control("dragOptionPushButton")->IsEffectivelyEnabled());
+  ASSERT_TRUE(Click("checkGeomDrag"));
+  EXPECT_TRUE(Enabled("dragOptionPushButton"));
+  ASSERT_TRUE(Click("checkCstVisu"));
+  EXPECT_TRUE(Enabled("comboCstColor"));
+  EXPECT_TRUE(Enabled("cstTypesPushButton"));
+  EXPECT_FALSE(Enabled("editorCstRefSize")); // locked
+  ASSERT_TRUE(Click("checkCstVisu"));
+  EXPECT_FALSE(Enabled("comboCstColor"));
+  ASSERT_TRUE(Click("checkGeomDrag"));
+  EXPECT_FALSE(Enabled("dragOptionPushButton"));
   ASSERT_EQ(_script.calls.size(), 4u);
   EXPECT_EQ(_script.calls[3].hook, "SetSysAllowGeomManip");
   EXPECT_EQ(_script.calls[3].values[0], 0.0);
@@ -119,10 +90,10 @@ TEST_F(GeoPage, ColoursAreReadThroughTheColourCombos) {
 
 TEST_F(GeoPage, ReferenceSizeIsAPaperLengthInMillimetresAtTheHooks) {
   int inch = 5;
-  ZEPSysSettingRepository::Open("DraftingOptions")->WriteAttr("DrwPaperLengthUnit", &inch, 1);
+  _pOptions->WriteAttr("DrwPaperLengthUnit", &inch, 1);
   _script.values = {{"DisplayCst", {1}}, {"RefSizeCst", {2.5}}};
   Open();
-  auto* spinner = ZEPSysDynamicCast<ZEPDlgSpinner>(Control("editorCstRefSize"));
+  auto* spinner = Spinner("editorCstRefSize");
   EXPECT_DOUBLE_EQ(spinner->GetValue(), 0.0025);
   EXPECT_EQ(spinner->UnitSymbol(), "in");
   ASSERT_TRUE(ZEPDlgDriver::Enter(spinner, 0.004));
@@ -142,11 +113,9 @@ TEST_F(GeoPage, DragModeRadiosWriteOnlyChanges) {
                {7, "radioDragModeStd"}};
   for (const auto& c : cases) {
     _script.values = {{"AllowGeomManip", {1}}, {"DragSolveMode", {c.stored}}};
-    auto* window = new ZEPDlgWindow(&_root, "window", 0);
-    _pPage = OpenPage<RecordingGeoPage>(_script, window);
+    Open();
     OpenDialog("dragOptionPushButton", "geoAllowGeomManip");
-    EXPECT_EQ(Radio(c.shown)->GetState(), ZEPDlgChecked) << c.stored;
-    delete window;
+    EXPECT_TRUE(Checked(c.shown)) << c.stored;
   }
   // Stored 7 shows the standard radio; a notification with that radio still on writes 0.
   _script.calls.clear();
@@ -154,14 +123,11 @@ TEST_F(GeoPage, DragModeRadiosWriteOnlyChanges) {
   OpenDialog("dragOptionPushButton", "geoAllowGeomManip");
   Radio("radioDragModeStd")
       ->SendNotification(Radio("radioDragModeStd")->GetRadBModifyNotification());
-  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radioDragModeStd"))); // already on: nothing
-  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radioDragModeRel")));
-  ASSERT_TRUE(ZEPDlgDriver::Click(Radio("radioDragModeMin")));
-  std::vector<double> written;
-  for (const HookCall& c : _script.calls)
-    written.push_back(c.values[0]);
+  ASSERT_TRUE(Click("radioDragModeStd")); // already on: nothing
+  ASSERT_TRUE(Click("radioDragModeRel"));
+  ASSERT_TRUE(Click("radioDragModeMin"));
   EXPECT_EQ(Hooks(), std::vector<std::string>(3, "SetSysDragSolveMode"));
-  EXPECT_EQ(written, (std::vector<double>{0, 2, 1}));
+  EXPECT_EQ(Written("SetSysDragSolveMode"), (std::vector<double>{0, 2, 1}));
 }
 
 TEST_F(GeoPage, EverySubDialogOpensOnceWritesAndForgetsItsControlsWhenClosed) {
@@ -170,9 +136,8 @@ TEST_F(GeoPage, EverySubDialogOpensOnceWritesAndForgetsItsControlsWhenClosed) {
                     {"SmartPickHoriVerti", {1}},
                     {"CstVisuSym", {1}}};
   Open();
-  EXPECT_EQ(CheckOf("checkSmartPickHoriVerti"), nullptr); // not before the push
-  const char* const inside[] = {"checkDragWithEndPts", "checkSmartPickHoriVerti",
-                                "checkCstVisuSym"};
+  EXPECT_EQ(As<ZEPDlgCheckButton>("checkSmartPickHoriVerti"), nullptr); // not before the push
+  const char* const inside[] = {"checkDragWithEndPts", "checkSmartPickHoriVerti", "checkCstVisuSym"};
   const char* const hooks[] = {"SetSysDragWithEndPts", "SetSysSmartPickHoriVerti",
                                "SetSysCstVisuSym"};
   for (int i = 0; i < 3; ++i) {
@@ -183,11 +148,10 @@ TEST_F(GeoPage, EverySubDialogOpensOnceWritesAndForgetsItsControlsWhenClosed) {
       EXPECT_EQ(dialog->GetVisibility(), ZEPDlgShow);
       // A second press shows the open dialog and creates nothing.
       dialog->SetVisibility(ZEPDlgHide);
-      ASSERT_TRUE(ZEPDlgDriver::Click(Control(kDialogs[i][0])));
-      EXPECT_EQ(DialogsNamed(kDialogs[i][1]), 1);
+      ASSERT_TRUE(Click(kDialogs[i][0]));
+      EXPECT_EQ(Children(kDialogs[i][1]).size(), 1u);
       EXPECT_EQ(dialog->GetVisibility(), ZEPDlgShow);
-      auto* check =
-          ZEPSysDynamicCast<ZEPDlgCheckButton>(ZEPDlgDriver::FindControl(dialog, inside[i]));
+      auto* check = As<ZEPDlgCheckButton>(inside[i], dialog);
       const bool wasOn = check->GetState() == ZEPDlgChecked;
       EXPECT_EQ(wasOn, windowClose != (i != 0))
           << "shows the cached value: stored, then as last written";
@@ -199,15 +163,12 @@ TEST_F(GeoPage, EverySubDialogOpensOnceWritesAndForgetsItsControlsWhenClosed) {
       ASSERT_TRUE(ZEPDlgDriver::Click(check));
       EXPECT_EQ(_script.calls.size(), 1u);
       ZEPDlgDriver::Idle();
-      EXPECT_EQ(DialogsNamed(kDialogs[i][1]), 0);
+      EXPECT_EQ(Children(kDialogs[i][1]).size(), 0u);
     }
   }
   // A fresh dialog shows the value written from the previous one.
   ZEPDlgDialog* dialog = OpenDialog("cstTypesPushButton", "geoTypeCst");
-  EXPECT_EQ(
-      ZEPSysDynamicCast<ZEPDlgCheckButton>(ZEPDlgDriver::FindControl(dialog, "checkCstVisuSym"))
-          ->GetState(),
-      ZEPDlgChecked);
+  EXPECT_TRUE(Checked("checkCstVisuSym", dialog));
   EXPECT_EQ(ZEPCheckLog::Count(), 0);
 }
 
@@ -217,12 +178,11 @@ TEST_F(GeoPage, LockedSettingsInsideADialogStayLocked) {
   _script.values = {{"AllowGeomManip", {1}}, {"DisplayCst", {1}}};
   Open();
   ZEPDlgDialog* drag = OpenDialog("dragOptionPushButton", "geoAllowGeomManip");
-  ZEPDialog* frame = ZEPDlgDriver::Find(drag, "frameDragMode");
-  ASSERT_NE(frame, nullptr);
-  EXPECT_FALSE(ZEPDlgDriver::Click(Radio("radioDragModeRel")));
-  EXPECT_TRUE(ZEPDlgDriver::Click(Control("checkDragWithEndPts")));
+  ASSERT_NE(Find("frameDragMode", drag), nullptr);
+  EXPECT_FALSE(Click("radioDragModeRel"));
+  EXPECT_TRUE(Click("checkDragWithEndPts"));
   ZEPDlgDialog* types = OpenDialog("cstTypesPushButton", "geoTypeCst");
-  EXPECT_FALSE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(types, "checkCstVisuPerpen")));
-  EXPECT_TRUE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(types, "checkCstVisuPara")));
+  EXPECT_FALSE(Click("checkCstVisuPerpen", types));
+  EXPECT_TRUE(Click("checkCstVisuPara", types));
   EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysDragWithEndPts", "SetSysCstVisuPara"}));
 }

@@ -6,13 +6,8 @@
 #include "ZEPDrwLockSpinner.h"
 
 namespace {
-class GridPage : public ZEPHostTest {
+class GridPage : public PageTest<RecordingGridPage> {
 protected:
-  RecordingGridPage* Open() { return _pPage = OpenPage<RecordingGridPage>(_script, &_root); }
-  ZEPDlgSpinner* Spinner(const char* iName) {
-    return ZEPSysDynamicCast<ZEPDlgSpinner>(ZEPDlgDriver::Find(_pPage, std::string(iName) + "_dialog"));
-  }
-  ZEPDialog* Control(const char* iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
   // Scripted values of every per-range attribute, distinct per range.
   void ScriptRanges() {
     _script.values["PrimSpaceH"] = {100, 200, 300, 400, 500};
@@ -20,40 +15,23 @@ protected:
     _script.values["GradH"] = {1, 2, 3, 4, 5};
     _script.values["GradV"] = {6, 7, 8, 9, 10};
   }
-  bool SelectRange(int iRange) {
-    auto* combo = ZEPSysDynamicCast<ZEP2DBaseRangeCmb>(ZEPDlgDriver::Find(_pPage, "cmbGridRange"));
-    return combo && ZEPDlgDriver::Select(combo, iRange - 1); // all five ranges are activated
+  bool SelectRange(int iRange) { // all five ranges are activated
+    return ZEPDlgDriver::Select(As<ZEP2DBaseRangeCmb>("cmbGridRange"), iRange - 1);
   }
-
-  HookScript _script;
-  RecordingGridPage* _pPage = nullptr;
 };
 } // namespace
 
-TEST_F(GridPage, ModuleHooksShowZerosAndLeaveSnapOut) {
-  Open();
-  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "checkSnap"), nullptr);
-  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "checkGrid")->GetGridConstraints().row, 1);
-  for (const char* name : {"editorGridSpacing", "editorGridSpacingV", "editorGridGraduation", "editorGridGraduationV"})
-    EXPECT_EQ(Spinner(name)->GetValue(), 0.0) << name;
-  EXPECT_EQ(ZEPSysDynamicCast<ZEPDlgCheckButton>(Control("checkGrid"))->GetState(), ZEPDlgUnchecked);
-  EXPECT_EQ(ZEPSysDynamicCast<ZEPDlgCheckButton>(Control("checkAllowDistortions"))->GetState(), ZEPDlgUnchecked);
-  EXPECT_FALSE(Spinner("editorGridSpacingV")->IsEffectivelyEnabled());
-  EXPECT_FALSE(Spinner("editorGridGraduationV")->IsEffectivelyEnabled());
+TEST_F(GridPage, ModuleHooksAndAllInfoHooksAnsweringZero) {
+  Open(); // the zeros, the disabled vertical values and no snap check are in the dump
   EXPECT_EQ(_script.reads, (std::vector<std::string>{"DisplayGrid", "SnapToPoint", "AllowDistortions", "PrimSpaceH",
                                                      "PrimSpaceV", "GradH", "GradV"}));
   ExpectGolden("grid_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
-}
-
-TEST_F(GridPage, AllInfoHooksAnsweringZero) {
+  _script = HookScript();
   _script.allInfoSet = true;
   _script.values["DisplayGrid"] = {1};
   _script.values["SnapToPoint"] = {1};
   ScriptRanges();
   Open();
-  ASSERT_NE(ZEPDlgDriver::Find(_pPage, "checkSnap"), nullptr);
-  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "checkGrid")->GetGridConstraints().row, 0);
-  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "checkSnap")->GetGridConstraints().row, 1);
   ExpectGolden("grid_page_info_zero.dump", ZEPDlgDriver::Dump(_pPage));
 }
 
@@ -146,7 +124,7 @@ TEST_F(GridPage, LockedVerticalSpacingStaysDisabledWhenDistortionEnablesIt) {
   _script.allInfoSet = true;
   _script.locked = {"PrimSpaceV"};
   Open();
-  ASSERT_TRUE(ZEPDlgDriver::Click(Control("checkAllowDistortions")));
+  ASSERT_TRUE(Click("checkAllowDistortions"));
   EXPECT_TRUE(Spinner("editorGridGraduationV")->IsEffectivelyEnabled());
   EXPECT_FALSE(Spinner("editorGridSpacingV")->IsEffectivelyEnabled());
   EXPECT_FALSE(ZEPDlgDriver::Enter(Spinner("editorGridSpacingV"), 1.0));
@@ -158,8 +136,7 @@ TEST_F(GridPage, UnavailableScalesServiceKeepsTheRange) {
   Open();
   ASSERT_TRUE(SelectRange(4));
   ZEPScalesSetup::SetAvailable(false);
-  auto* combo = ZEPSysDynamicCast<ZEP2DBaseRangeCmb>(ZEPDlgDriver::Find(_pPage, "cmbGridRange"));
-  ASSERT_TRUE(ZEPDlgDriver::Select(combo, 1));
+  ASSERT_TRUE(SelectRange(2));
   EXPECT_DOUBLE_EQ(Spinner("editorGridSpacing")->GetValue(), 0.4); // still range 4
   ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("editorGridSpacing"), 1.0));
   EXPECT_EQ(_script.Calls("SetSysPrimSpaceH").at(0).values, (std::vector<double>{100, 200, 300, 1000, 500}));

@@ -4,6 +4,7 @@
 
 #include <cmath>
 #include <limits>
+#include <set>
 
 namespace {
 #define ZEP_SETTING(Name, Kind) #Name,
@@ -12,33 +13,12 @@ const char* const kAttributes[] = {
 };
 #undef ZEP_SETTING
 
-class ManipPage : public ZEPHostTest {
-protected:
-  void SetUp() override {
-    ZEPHostTest::SetUp();
-    ZEPSysSettingRepository::Open("DraftingOptions");
-  }
-  void Open() { _pPage = OpenPage<RecordingManipPage>(_script, &_root); }
-  ZEPDialog* Control(const std::string& iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
-  ZEPDlgSpinner* SpinnerOf(const char* iName) {
-    return ZEPSysDynamicCast<ZEPDlgSpinner>(Control(iName));
-  }
-  HookScript _script;
-  RecordingManipPage* _pPage = nullptr;
-};
+using ManipPage = PageTest<RecordingManipPage>;
 } // namespace
 
 TEST_F(ManipPage, ModuleHooksShowZerosAndEveryGetterIsRead) {
-  Open();
-  for (const char* name : {"editorManipRefSize", "editorManipTransparency", "spnPaperGridSpacing",
-                           "spinnerRotSnapAngle"})
-    EXPECT_EQ(SpinnerOf(name)->GetValue(), 0.0) << name;
-  ASSERT_EQ(_script.reads.size(), 42u);
-  EXPECT_EQ(std::vector<std::string>(_script.reads.begin(), _script.reads.begin() + 8),
-            (std::vector<std::string>{"ManipRefSize", "ManipTransparency", "ManipZoom",
-                                      "PaperGridSpacing", "SnapToPaperGrid", "RotationSnapAngle",
-                                      "RotationAutoSnap", "SnapOnDirection"}));
-  EXPECT_EQ(_script.reads.back(), "ManipMovableDatumMod");
+  Open(); // the zeros are in the dump
+  EXPECT_EQ(std::set<std::string>(_script.reads.begin(), _script.reads.end()).size(), std::size(kAttributes));
   EXPECT_EQ(ZEPCheckLog::Count(), 0);
   ExpectGolden("manip_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
 }
@@ -49,21 +29,17 @@ TEST_F(ManipPage, BuildFlagAndLayoutOptionDecideTheDimensionRows) {
     bool dimensions, datum;
   } cases[] = {{1, 1, true, true}, {1, 0, false, true}, {0, 1, false, false}, {0, 0, false, false}};
   for (const auto& c : cases) {
-    HookScript script;
-    script.options = {{"BuildFlag", c.flag}, {"WithDimManipSection", c.option}};
-    auto* window = new ZEPDlgWindow(&_root, "window", 0);
-    auto* page = OpenPage<RecordingManipPage>(script, window);
+    _script = HookScript();
+    _script.options = {{"BuildFlag", c.flag}, {"WithDimManipSection", c.option}};
+    Open();
     const std::string when = "flag " + std::to_string(c.flag) + " option " + std::to_string(c.option);
-    EXPECT_EQ(ZEPDlgDriver::Find(page, "frameDim") != nullptr, c.dimensions) << when;
-    EXPECT_EQ(ZEPDlgDriver::Find(page, "_checkDimORunCre") != nullptr, c.dimensions) << when;
-    EXPECT_EQ(ZEPDlgDriver::Find(page, "_labelManipMovableDatum") != nullptr, c.datum) << when;
-    EXPECT_EQ(ZEPDlgDriver::Find(page, "_checkManipMovableDatumMod") != nullptr, c.datum) << when;
+    EXPECT_EQ(Find("frameDim") != nullptr, c.dimensions) << when;
+    EXPECT_EQ(Find("_checkDimORunCre") != nullptr, c.dimensions) << when;
+    EXPECT_EQ(Find("_labelManipMovableDatum") != nullptr, c.datum) << when;
+    EXPECT_EQ(Find("_checkManipMovableDatumMod") != nullptr, c.datum) << when;
     // Frames take the next free row: no gap where the dimension matrix is missing.
-    EXPECT_EQ(ZEPDlgDriver::Find(page, "frameAnnotManip")->GetGridConstraints().row,
-              c.dimensions ? 5 : 4)
-        << when;
-    EXPECT_EQ(script.reads.size(), 42u) << "rows not built are read all the same; " << when;
-    delete window;
+    EXPECT_EQ(Row("frameAnnotManip"), c.dimensions ? 5 : 4) << when;
+    EXPECT_EQ(_script.reads.size(), 42u) << "rows not built are read all the same; " << when;
   }
 }
 
@@ -100,61 +76,46 @@ TEST_F(ManipPage, EveryMatrixCellWritesItsOwnAttribute) {
                             {"_checkDimMoveLeaderCre", 9},
                             {"_checkManipRotateAnnotCre", 1},
                             {"_checkManipMovableDatumMod", 8}})
-    EXPECT_EQ(ZEPDlgDriver::Find(_pPage, named.first)->GetGridConstraints().row, named.second)
-        << named.first;
+    EXPECT_EQ(Row(named.first), named.second) << named.first;
   // The row's text lives only in its label: the checks have none, but the label's help.
-  auto* label = ZEPDlgDriver::Find(_pPage, "_labelDimChangeSymbol");
-  auto* check = ZEPDlgDriver::Find(_pPage, "_checkDimChangeSymbolCre");
-  EXPECT_TRUE(check->GetTitle().IsEmpty());
-  EXPECT_FALSE(label->GetLongHelp().IsEmpty());
-  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "_labelIconDimChangeSymbol"), nullptr);
-  EXPECT_EQ(ZEPDlgDriver::Find(_pPage, "_labelIconChangeSymbol")->GetChildren().back()->GetIconName(),
+  EXPECT_TRUE(Find("_checkDimChangeSymbolCre")->GetTitle().IsEmpty());
+  EXPECT_FALSE(Find("_labelDimChangeSymbol")->GetLongHelp().IsEmpty());
+  EXPECT_EQ(Find("_labelIconDimChangeSymbol"), nullptr);
+  EXPECT_EQ(Find("_labelIconChangeSymbol")->GetChildren().back()->GetIconName(),
             "S_DrwManipMoveLeader");
 }
 
 TEST_F(ManipPage, TransparencyIsAPercentRoundedToTheNearestPoint) {
   _script.values = {{"ManipTransparency", {35}}};
   Open();
-  ZEPDlgSpinner* spinner = SpinnerOf("editorManipTransparency");
+  ZEPDlgSpinner* spinner = Spinner("editorManipTransparency");
   EXPECT_DOUBLE_EQ(spinner->GetValue(), 0.35);
   EXPECT_EQ(spinner->FormatValue(spinner->GetValue()), "35 %");
   EXPECT_EQ(spinner->GetRangeFlag(), 1);
-  const struct {
-    double entered;
-    int written;
-  } cases[] = {{0.29, 29}, {0.57, 57}, {0.58, 58}, {0.005, 1}, {0.004, 0}, {1.7, 100}, {-2, 0}};
-  for (const auto& c : cases) {
-    _script.calls.clear();
-    ASSERT_TRUE(ZEPDlgDriver::Enter(spinner, c.entered));
-    ASSERT_EQ(_script.calls.size(), 1u);
-    EXPECT_EQ(_script.calls[0].hook, "SetSysManipTransparency");
-    EXPECT_EQ(_script.calls[0].values[0], c.written) << c.entered;
-  }
+  for (double entered : {0.29, 0.57, 0.58, 0.005, 0.004, 1.7, -2.0})
+    ASSERT_TRUE(ZEPDlgDriver::Enter(spinner, entered)) << entered;
+  EXPECT_EQ(Written("SetSysManipTransparency"), (std::vector<double>{29, 57, 58, 1, 0, 100, 0}));
+  EXPECT_EQ(_script.calls.size(), 7u);
   // Values a user cannot enter still give a valid int.
-  const struct {
-    double value;
-    double written;
-  } odd[] = {{std::nan(""), 0}, {1e12, std::numeric_limits<int>::max()},
-             {-1e12, std::numeric_limits<int>::min()}};
-  for (const auto& o : odd) {
-    _script.calls.clear();
-    spinner->SetValue(o.value, 0);
+  _script.calls.clear();
+  for (double value : {std::nan(""), 1e12, -1e12}) {
+    spinner->SetValue(value, 0);
     spinner->SendNotification(spinner->GetSpinnerModifyNotification());
-    ASSERT_EQ(_script.calls.size(), 1u);
-    EXPECT_EQ(_script.calls[0].values[0], o.written) << o.value;
   }
+  EXPECT_EQ(Written("SetSysManipTransparency"),
+            (std::vector<double>{0, std::numeric_limits<int>::max(), std::numeric_limits<int>::min()}));
 }
 
 TEST_F(ManipPage, LengthsInMillimetresAndAnglesInDegreesAtTheHooks) {
   _script.values = {{"ManipRefSize", {5.0}}, {"RotationSnapAngle", {15.0}},
                     {"PaperGridSpacing", {0.0}}};
   Open();
-  EXPECT_DOUBLE_EQ(SpinnerOf("editorManipRefSize")->GetValue(), 0.005);
-  EXPECT_DOUBLE_EQ(SpinnerOf("spinnerRotSnapAngle")->GetValue(), 0.2617993877991509);
-  ASSERT_TRUE(ZEPDlgDriver::Enter(SpinnerOf("editorManipRefSize"), 0.012));
-  ASSERT_TRUE(ZEPDlgDriver::Enter(SpinnerOf("spinnerRotSnapAngle"), std::atan(1.0)));
-  ASSERT_TRUE(ZEPDlgDriver::Enter(SpinnerOf("spinnerRotSnapAngle"), -1.0)); // may be negative
-  ASSERT_TRUE(ZEPDlgDriver::Enter(SpinnerOf("spnPaperGridSpacing"), 0.0));  // may be 0
+  EXPECT_DOUBLE_EQ(Spinner("editorManipRefSize")->GetValue(), 0.005);
+  EXPECT_DOUBLE_EQ(Spinner("spinnerRotSnapAngle")->GetValue(), 0.2617993877991509);
+  ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("editorManipRefSize"), 0.012));
+  ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("spinnerRotSnapAngle"), std::atan(1.0)));
+  ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("spinnerRotSnapAngle"), -1.0)); // may be negative
+  ASSERT_TRUE(ZEPDlgDriver::Enter(Spinner("spnPaperGridSpacing"), 0.0));  // may be 0
   ASSERT_EQ(_script.calls.size(), 4u);
   EXPECT_EQ(_script.calls[0].hook, "SetSysManipRefSize");
   EXPECT_DOUBLE_EQ(_script.calls[0].values[0], 12.0);
@@ -171,7 +132,7 @@ TEST_F(ManipPage, AllInfoHooksAnsweringZero) {
   _script.values = {{"ManipTransparency", {40}}, {"ManipZoom", {1}}, {"DimChangeSymbolCre", {1}},
                     {"ManipMovableDatumMod", {1}}};
   Open();
-  EXPECT_FALSE(Control("_checkDimBlankMod")->IsEffectivelyEnabled());
+  EXPECT_FALSE(Enabled("_checkDimBlankMod"));
   EXPECT_FALSE(ZEPDlgDriver::Enter(Control("editorManipTransparency"), 0.5));
   EXPECT_TRUE(_script.calls.empty());
   ExpectGolden("manip_page_info_zero.dump", ZEPDlgDriver::Dump(_pPage));
