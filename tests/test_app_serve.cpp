@@ -200,6 +200,22 @@ TEST_F(ServeTest, SubDialogControlsAreSetAsOnTheirPage) {
   EXPECT_TRUE(Has(hidden.value("error", ""), "unknown control")); // its dialog is not open
 }
 
+// The PLM buttons offer what they take: the add button the repository's standards, the remove
+// button the listed ones; a pick sends the standard's key.
+TEST_F(ServeTest, PLMButtonsOfferTheirStandardsAndAPickSendsItsKey) {
+  const nlohmann::json add = Control(State(), "main", "pusStandardPLMAdd");
+  ASSERT_EQ(add["values"].size(), add["choices"].size());
+  ASSERT_GE(add["values"].size(), 3u);
+  EXPECT_TRUE(Control(State(), "main", "pusStandardPLMRemove")["values"].is_null()); // nothing listed yet
+  const std::string key = add["values"][2]; // the second of two standards of the same name
+  const nlohmann::json answer = Change("main", "pusStandardPLMAdd", key);
+  ASSERT_TRUE(answer["ok"]) << answer["message"];
+  EXPECT_EQ(Control(answer["state"], "main", "pusStandardPLMRemove")["values"], nlohmann::json::array({key}));
+  const std::string choice = add["choices"][2];
+  EXPECT_TRUE(Has(choice, key));
+  EXPECT_EQ(Control(answer["state"], "main", "cmbStandardName")["shown"], choice.substr(0, choice.find("  (key")));
+}
+
 TEST_F(ServeTest, TwoClientsChangingAtOnceLoseNothing) {
   auto changes = [this](const char* iPage, const char* iControl, int iFrom) {
     for (int i = 0; i < 4; ++i)
