@@ -112,42 +112,13 @@ TEST_F(AdminPage, EnvironmentSectionShowsTrueDimensionsWithTheirOwnPadlock) {
   }
 }
 
-TEST_F(AdminPage, RadioGroupsWriteOncePerChange) {
+// The view name scope radios follow the view name check. (What each radio group shows and
+// writes is a test of every page.)
+TEST_F(AdminPage, ScopeRadiosFollowTheViewNameCheck) {
   _script.allInfoSet = true;
-  _script.values = {{"ViewNamesUnicity", {1}},
-                    {"ViewNameUnicityScope", {5}},
-                    {"SelectionOnCurrentAssembly", {7}},
-                    {"EnggConLocation", {1}}};
+  _script.values = {{"ViewNamesUnicity", {1}}};
   Open();
-  EXPECT_TRUE(Checked("radViewNameUnicityInLayout"));
-  EXPECT_FALSE(Checked("radViewNameUnicityInSheet"));
-  for (const char* none : {"radElemUnderCurAssemblyRoot", "radElemUnderCurFavContextRoot",
-                           "radAnyRelevantElement"})
-    EXPECT_FALSE(Checked(none)) << none;
-  EXPECT_TRUE(Checked("radSelectedAssGeomWithAnnotation"));
-  const struct {
-    const char* radio;
-    const char* hook;
-    double written; // -1: nothing written
-  } clicks[] = {{"radViewNameUnicityInSheet", "SetSysViewNameUnicityScope", 0},
-                {"radViewNameUnicityInLayout", "SetSysViewNameUnicityScope", 1},
-                {"radAnyRelevantElement", "SetSysSelectionOnCurrentAssembly", 2},
-                {"radElemUnderCurAssemblyRoot", "SetSysSelectionOnCurrentAssembly", 0},
-                {"radElemUnderCurFavContextRoot", "SetSysSelectionOnCurrentAssembly", 1},
-                {"radSelectedAssGeom", "SetSysEnggConLocation", 0},
-                {"radSelectedAssGeomWithAnnotation", "SetSysEnggConLocation", 1},
-                {"radSelectedAssGeomWithAnnotation", "", -1}};
-  for (const auto& c : clicks) {
-    _script.calls.clear();
-    ASSERT_TRUE(Click(c.radio)) << c.radio;
-    if (c.written < 0) {
-      EXPECT_TRUE(_script.calls.empty()) << c.radio;
-      continue;
-    }
-    ASSERT_EQ(Hooks(), std::vector<std::string>{c.hook}) << c.radio;
-    EXPECT_EQ(_script.calls[0].values[0], c.written) << c.radio;
-  }
-  // The scope radios follow the view name check.
+  EXPECT_TRUE(Enabled("radViewNameUnicityInSheet"));
   ASSERT_TRUE(Click("checkViewNamesUnicity"));
   EXPECT_FALSE(Enabled("radViewNameUnicityInSheet"));
   EXPECT_FALSE(Enabled("radViewNameUnicityInLayout"));

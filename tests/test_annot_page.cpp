@@ -1,4 +1,4 @@
-// Annotation page: its two layouts, the area fill radios, the callout size overrun, and the two
+// Annotation page: its two layouts, the callout size overrun, and the two
 // dialogs of the newer dialog framework opened, ended every way, and outlived by their events.
 #include "RecordingPages.h"
 
@@ -83,23 +83,6 @@ TEST_F(AnnotPage, EveryCheckWritesItsOwnAttribute) {
     ASSERT_EQ(Hooks(), std::vector<std::string>{std::string("SetSys") + c[1]});
     EXPECT_EQ(_script.calls[0].values[0], 0.0);
   }
-}
-
-TEST_F(AnnotPage, AreaFillRadiosWriteOncePerChange) {
-  for (double stored : {2.0, 1.0}) {
-    _script.values = {{"AreaFillOptimizationMode", {stored}}};
-    Open();
-    EXPECT_EQ(Checked("radOptimImport"), stored == 1.0) << stored;
-    EXPECT_FALSE(Checked("radOptimGenAndGeo")) << stored;
-  }
-  _script.values.clear();
-  Open();
-  ASSERT_TRUE(Click("radOptimGenAndGeo")); // already on
-  ASSERT_TRUE(Click("radOptimImport"));
-  ASSERT_TRUE(Click("radOptimGenAndGeo"));
-  ASSERT_EQ(Hooks(), std::vector<std::string>(2, "SetSysAreaFillOptimizationMode"));
-  EXPECT_EQ(_script.calls[0].values[0], 1.0);
-  EXPECT_EQ(_script.calls[1].values[0], 0.0);
 }
 
 TEST_F(AnnotPage, EachDialogOpensOnceAndEveryEndingFreesBothButtons) {

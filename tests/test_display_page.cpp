@@ -1,5 +1,5 @@
 // Display page: sections on both sides of each layout predicate, optional controls on both sides
-// of "exactly 0", the radio pairs, the capping frame's padlocks, and the analysis display and
+// of "exactly 0", the capping frame's padlocks, and the analysis display and
 // diagnosis colour dialogs row by row.
 #include "RecordingPages.h"
 
@@ -155,43 +155,6 @@ TEST_F(DisplayPage, PageChecksAndTheirDependants) {
   EXPECT_EQ(Hooks(),
             (std::vector<std::string>{"SetSysAnnotInSpecTreePlane", "SetSysDimAnalysisDisplay",
                                       "SetSysVisuDiagnostic", "SetSysBackgroundInViewFrame"}));
-}
-
-TEST_F(DisplayPage, RadioPairsShowTheirValueAndWriteOncePerChange) {
-  const struct {
-    const char* attribute;
-    const char* first;  // written as firstValue
-    const char* second; // written as secondValue
-    double firstValue, secondValue;
-    double shownSecond; // the stored value that selects the second radio
-  } cases[] = {{"BackgroundInViewFrameMode", "radBackgroundInViewFrameAuto",
-                "radBackgroundInViewFrameDemand", 1, 2, 2},
-               {"CappingBackground", "radCappingColorFix", "radCappingColorFromFace", 0, 1, 1},
-               {"CappingPattern", "radCappingPatternNone", "radCappingPatternMaterial", 0, 1, 1}};
-  for (const auto& c : cases)
-    for (double stored : {0.0, 1.0, 2.0, 7.0}) {
-      _script.values = {{"BackgroundInViewFrame", {1}}, {c.attribute, {stored}}};
-      _script.calls.clear();
-      Open();
-      const bool second = stored == c.shownSecond;
-      EXPECT_EQ(Checked(c.second), second) << c.attribute << stored;
-      EXPECT_EQ(Checked(c.first), !second) << c.attribute << stored;
-      // Click the other radio, the one already on, and back: two writes.
-      const char* other = second ? c.first : c.second;
-      ASSERT_TRUE(Click(other));
-      ASSERT_TRUE(Click(other));
-      ASSERT_TRUE(Click(second ? c.second : c.first));
-      std::vector<double> written;
-      for (const HookCall& call : _script.calls)
-        written.push_back(call.values[0]);
-      const double toOther = second ? c.firstValue : c.secondValue;
-      const double back = second ? c.secondValue : c.firstValue;
-      // Coming back to a stored value the radios do not show (7) writes what they show.
-      if (stored == toOther)
-        EXPECT_EQ(written, std::vector<double>{back}) << c.attribute << stored;
-      else
-        EXPECT_EQ(written, (std::vector<double>{toOther, back})) << c.attribute << stored;
-    }
 }
 
 TEST_F(DisplayPage, CappingColourFollowsTheBackgroundRadiosAndBothPadlocks) {

@@ -1,8 +1,10 @@
-// What every page shares: foreign senders are ignored, locks beat the page's rules.
+// What every page shares: foreign senders are ignored, locks beat the page's rules, radio
+// groups show the stored value and write on change only.
 #include "RecordingPages.h"
 
 #include <algorithm>
 #include <functional>
+#include <map>
 
 namespace {
 struct PageCase {
@@ -195,4 +197,127 @@ TEST_P(EveryPage, ModuleHooksAcceptEveryChangeWithoutFailing) {
 INSTANTIATE_TEST_SUITE_P(Pages, EveryPage, ::testing::ValuesIn(Pages()),
                          [](const ::testing::TestParamInfo<PageCase>& i) {
                            return std::string(i.param.name);
+                         });
+
+namespace {
+// A radio group of a page: what it shows for each stored value, and what each radio writes.
+struct RadioGroup {
+  const char* page;
+  std::map<std::string, std::vector<double>> values; // what keeps the group enabled
+  const char* button;                                // opens the group's dialog; null on the page
+  const char* attribute;
+  std::vector<std::pair<const char*, double>> radios; // each radio and the value it writes
+  std::vector<std::pair<double, const char*>> shown;  // stored value, the radio on ("" none)
+};
+void PrintTo(const RadioGroup& iGroup, std::ostream* oStream) { *oStream << iGroup.attribute; }
+
+std::vector<RadioGroup> RadioGroups() {
+  return {{"Dimension", {}, nullptr, "DimCreateCircle",
+           {{"_radioDimCircleCenter", 0}, {"_radioDimCircleEdge", 1}},
+           {{0, "_radioDimCircleCenter"}, {1, "_radioDimCircleEdge"}, {-1, "_radioDimCircleCenter"},
+            {2, "_radioDimCircleCenter"}}},
+          {"Dimension", {}, "pushAssoc3D", "DimAssoc3DMod",
+           {{"_radioDimForce2DAlways", 2}, {"_radioDimForce2DWhenPb", 1}, {"_radioDimForce2DNever", 0}},
+           {{2, "_radioDimForce2DAlways"}, {1, "_radioDimForce2DWhenPb"}, {0, "_radioDimForce2DNever"},
+            {5, "_radioDimForce2DNever"}}},
+          {"Geometry", {{"AllowGeomManip", {1}}}, "dragOptionPushButton", "DragSolveMode",
+           {{"radioDragModeStd", 0}, {"radioDragModeMin", 1}, {"radioDragModeRel", 2}},
+           {{0, "radioDragModeStd"}, {1, "radioDragModeMin"}, {2, "radioDragModeRel"}, {7, "radioDragModeStd"}}},
+          {"Display", {{"BackgroundInViewFrame", {1}}}, nullptr, "BackgroundInViewFrameMode",
+           {{"radBackgroundInViewFrameAuto", 1}, {"radBackgroundInViewFrameDemand", 2}},
+           {{0, "radBackgroundInViewFrameAuto"}, {1, "radBackgroundInViewFrameAuto"},
+            {2, "radBackgroundInViewFrameDemand"}, {7, "radBackgroundInViewFrameAuto"}}},
+          {"Display", {}, nullptr, "CappingBackground",
+           {{"radCappingColorFix", 0}, {"radCappingColorFromFace", 1}},
+           {{0, "radCappingColorFix"}, {1, "radCappingColorFromFace"}, {2, "radCappingColorFix"},
+            {7, "radCappingColorFix"}}},
+          {"Display", {}, nullptr, "CappingPattern",
+           {{"radCappingPatternNone", 0}, {"radCappingPatternMaterial", 1}},
+           {{0, "radCappingPatternNone"}, {1, "radCappingPatternMaterial"}, {2, "radCappingPatternNone"},
+            {7, "radCappingPatternNone"}}},
+          {"Annotation", {}, nullptr, "AreaFillOptimizationMode",
+           {{"radOptimGenAndGeo", 0}, {"radOptimImport", 1}},
+           {{0, "radOptimGenAndGeo"}, {1, "radOptimImport"}, {2, ""}}},
+          {"Administration", {{"ViewNamesUnicity", {1}}}, nullptr, "ViewNameUnicityScope",
+           {{"radViewNameUnicityInSheet", 0}, {"radViewNameUnicityInLayout", 1}},
+           {{0, "radViewNameUnicityInSheet"}, {1, "radViewNameUnicityInLayout"}, {5, "radViewNameUnicityInLayout"}}},
+          {"Administration", {}, nullptr, "SelectionOnCurrentAssembly",
+           {{"radElemUnderCurAssemblyRoot", 0}, {"radElemUnderCurFavContextRoot", 1}, {"radAnyRelevantElement", 2}},
+           {{0, "radElemUnderCurAssemblyRoot"}, {2, "radAnyRelevantElement"}, {7, ""}}},
+          {"Administration", {}, nullptr, "EnggConLocation",
+           {{"radSelectedAssGeom", 0}, {"radSelectedAssGeomWithAnnotation", 1}},
+           {{0, "radSelectedAssGeom"}, {1, "radSelectedAssGeomWithAnnotation"}}}};
+}
+
+class EveryRadioGroup : public ZEPHostTest, public ::testing::WithParamInterface<RadioGroup> {
+protected:
+  void SetUp() override {
+    ZEPHostTest::SetUp();
+    ZEPSysSettingRepository::Open("DraftingOptions");
+  }
+};
+} // namespace
+
+// For each stored value: the radio it shows alone is on; clicking it writes nothing, each other
+// radio writes its value once however often it is clicked, and coming back writes the shown one.
+TEST_P(EveryRadioGroup, ShowsTheStoredValueAndWritesOnChangeOnly) {
+  const RadioGroup& group = GetParam();
+  const std::vector<PageCase> pages = Pages();
+  const auto page = std::find_if(pages.begin(), pages.end(),
+                                 [&](const PageCase& p) { return std::string(p.name) == group.page; });
+  ASSERT_NE(page, pages.end());
+  for (const auto& [stored, shown] : group.shown) {
+    SCOPED_TRACE("stored " + std::to_string(stored));
+    HookScript script;
+    script.allInfoSet = true; // every optional control exists
+    script.values = group.values;
+    script.values[group.attribute] = {stored};
+    auto* window = new ZEPDlgWindow(&_root, "window", 0);
+    ZEPDlgFrame* frame = page->open(script, window);
+    if (group.button) {
+      ASSERT_TRUE(ZEPDlgDriver::Click(ZEPDlgDriver::FindControl(frame, group.button)));
+    }
+    auto radio = [&](const char* iName) {
+      auto* found = ZEPSysDynamicCast<ZEPDlgRadioButton>(ZEPDlgDriver::FindControl(frame, iName));
+      EXPECT_NE(found, nullptr) << iName;
+      return found;
+    };
+    std::vector<double> expected;
+    double back = 0;
+    for (const auto& [name, value] : group.radios) {
+      ZEPDlgRadioButton* r = radio(name);
+      ASSERT_NE(r, nullptr);
+      const bool on = std::string(name) == shown;
+      EXPECT_EQ(r->GetState() == ZEPDlgChecked, on) << name;
+      if (on) back = value;
+      else expected.push_back(value);
+    }
+    EXPECT_TRUE(script.calls.empty());
+    if (*shown) {
+      ASSERT_TRUE(ZEPDlgDriver::Click(radio(shown)));
+    }
+    for (const auto& [name, value] : group.radios) {
+      if (std::string(name) == shown) continue;
+      for (int twice = 0; twice < 2; ++twice) {
+        ASSERT_TRUE(ZEPDlgDriver::Click(radio(name))) << name;
+      }
+    }
+    if (*shown) {
+      ASSERT_TRUE(ZEPDlgDriver::Click(radio(shown)));
+      expected.push_back(back);
+    }
+    std::vector<double> written;
+    for (const HookCall& call : script.calls) {
+      EXPECT_EQ(call.hook, std::string("SetSys") + group.attribute);
+      written.push_back(call.values.at(0));
+    }
+    EXPECT_EQ(written, expected);
+    delete window;
+    ZEPDlgDriver::Idle();
+  }
+}
+
+INSTANTIATE_TEST_SUITE_P(Groups, EveryRadioGroup, ::testing::ValuesIn(RadioGroups()),
+                         [](const ::testing::TestParamInfo<RadioGroup>& i) {
+                           return std::string(i.param.attribute);
                          });

@@ -26,16 +26,7 @@ namespace fs = std::filesystem;
 
 namespace {
 
-std::string Quote(const std::string& s) {
-  std::string q = "'";
-  for (char c : s) q += c == '\'' ? std::string("'\\''") : std::string(1, c);
-  return q + "'";
-}
-
-struct Result {
-  int code = -1;
-  std::string out, err;
-};
+using Result = CliResult;
 
 class SettingsStore : public SettingsFolderTest {
 protected:
@@ -47,33 +38,20 @@ protected:
 
   // In process; iArgs come after the file options.
   Result Run(const std::vector<std::string>& iArgs, bool iWithAdmin = true) {
-    std::vector<std::string> args = {"drafting-options", "--settings", _u};
+    std::vector<std::string> args = {"--settings", _u};
     if (iWithAdmin) args.insert(args.end(), {"--admin", _a});
     args.insert(args.end(), iArgs.begin(), iArgs.end());
-    std::vector<const char*> argv;
-    for (const std::string& a : args) argv.push_back(a.c_str());
-    std::ostringstream out, err;
-    Result r;
-    r.code = RunCli(static_cast<int>(argv.size()), argv.data(), out, err);
-    r.out = out.str();
-    r.err = err.str();
-    return r;
+    return RunInProcess(args);
   }
 
   // The binary, under a time limit so that a command that blocks fails instead of hanging.
   // iShell runs first in the same shell (ulimit ...).
   Result RunBinary(const std::string& iSettings, const std::string& iAdmin, const std::vector<std::string>& iArgs,
                    const std::string& iShell = "") {
-    std::string cmd = iShell + " exec timeout -s KILL 20 " + Quote(ZEP_APP_BINARY) + " --settings " +
-                      Quote(iSettings) + " --admin " + Quote(iAdmin);
-    for (const std::string& a : iArgs) cmd += " " + Quote(a);
-    cmd += " >" + Quote((_dir / "out.txt").string()) + " 2>" + Quote((_dir / "err.txt").string());
-    const int status = std::system(("sh -c " + Quote(cmd)).c_str());
-    Result r;
-    r.code = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-    r.out = ReadBytes(_dir / "out.txt");
-    r.err = ReadBytes(_dir / "err.txt");
-    return r;
+    std::string cmd = iShell + " exec timeout -s KILL 20 " + ShellQuote(ZEP_APP_BINARY) + " --settings " +
+                      ShellQuote(iSettings) + " --admin " + ShellQuote(iAdmin);
+    for (const std::string& a : iArgs) cmd += " " + ShellQuote(a);
+    return RunShell(cmd, _dir);
   }
 
   // The file names as the command line takes them.
