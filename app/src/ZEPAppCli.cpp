@@ -103,10 +103,7 @@ const char* KindName(ZEPAppKind iKind) {
 
 // Whether a row of the settings table holds one text rather than a list of texts.
 bool IsSingleText(const ZEPAppSetting& iSetting) {
-  for (const ZEPAppPage& p : AppPages())
-    if (p.table == iSetting.page)
-      if (auto kind = p.stored.find(iSetting.attribute); kind != p.stored.end()) return kind->second == ZEPAppStored::Text;
-  return false;
+  return StoredKindOf(iSetting) == ZEPAppStored::Text;
 }
 
 // A value as JSON: numbers in an array, one text as a string, a list of texts as an array of

@@ -62,8 +62,7 @@ const ZEPAppSetting* SettingOf(const ZEPAppPage& iPage, const std::string& iCont
 }
 
 const ZEPAppPage* PageOf(const ZEPAppSetting& iSetting) {
-  for (const ZEPAppPage& p : AppPages())
-    if (p.table == iSetting.page) return &p;
+  if (const ZEPAppPage* page = TablePage(iSetting)) return page;
   for (const ZEPAppPage& p : AppPages())
     if (p.Shows(iSetting)) return &p;
   return nullptr;

@@ -394,18 +394,25 @@ std::vector<std::string> DisagreeingSettings() {
   return found;
 }
 
+const ZEPAppPage* TablePage(const ZEPAppSetting& iSetting) {
+  for (const ZEPAppPage& p : AppPages())
+    if (p.table == iSetting.page) return &p;
+  return nullptr;
+}
+
+ZEPAppStored StoredKindOf(const ZEPAppSetting& iSetting) {
+  const ZEPAppPage* page = TablePage(iSetting);
+  if (!page) return ZEPAppStored::Unsupported;
+  const auto kind = page->stored.find(iSetting.attribute);
+  return kind == page->stored.end() ? ZEPAppStored::Unsupported : kind->second;
+}
+
 void ApplyDefaults() {
   for (const ZEPAppSetting& s : AppSettings()) {
     ZEPSysSettingRepository* rep = ZEPSysSettingRepository::GetRepository(s.repository.c_str(), 0);
     if (!rep) rep = ZEPSysSettingRepository::Open(s.repository);
     if (rep->Defaults().count(s.stored)) continue; // the administrator's default wins
-    const ZEPAppPage* page = nullptr;
-    for (const ZEPAppPage& p : AppPages())
-      if (p.table == s.page) page = &p;
-    auto kind = page ? page->stored.find(s.attribute)
-                     : std::map<std::string, ZEPAppStored>::const_iterator();
-    if (!page || kind == page->stored.end()) continue;
-    switch (kind->second) {
+    switch (StoredKindOf(s)) {
     case ZEPAppStored::Int:
       rep->SetDefault(s.stored, std::vector<int>(s.defaults.begin(), s.defaults.end()));
       break;

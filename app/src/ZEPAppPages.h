@@ -32,6 +32,11 @@ struct ZEPAppPage {
 
 const std::vector<ZEPAppPage>& AppPages();
 const ZEPAppPage* FindPage(const std::string& iName);
+// The page whose table holds a row of ZEPAppSettings.def (pages sharing a table store their
+// rows alike); null when none.
+const ZEPAppPage* TablePage(const ZEPAppSetting& iSetting);
+// How a row is stored, as its page's table says; Unsupported when no page says.
+ZEPAppStored StoredKindOf(const ZEPAppSetting& iSetting);
 
 // The repositories the pages use, each opened once.
 std::vector<std::string> AppRepositories();

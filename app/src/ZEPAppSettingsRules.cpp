@@ -114,19 +114,16 @@ std::string FormatNumber(double iValue) {
 std::vector<ZEPAppAttrRule> AppSettingRules() {
   std::vector<ZEPAppAttrRule> rules;
   for (const ZEPAppSetting& s : AppSettings()) {
-    const ZEPAppPage* page = nullptr;
-    for (const ZEPAppPage& p : AppPages())
-      if (p.table == s.page) page = &p;
+    const ZEPAppPage* page = TablePage(s);
+    const ZEPAppStored kind = StoredKindOf(s);
     ZEPAppAttrRule rule;
     rule.repository = s.repository;
     rule.attribute = s.stored;
     rule.count = s.defaults.size();
-    rule.type = std::size_t(-1); // any kind when the page does not say
-    if (page)
-      if (auto kind = page->stored.find(s.attribute); kind != page->stored.end()) rule.type = TypeIndex(kind->second);
+    rule.type = TypeIndex(kind); // any kind when the page does not say
     if (rule.type == kText) {
       // One text, or a list of any length; no limits either.
-      rule.count = page->stored.at(s.attribute) == ZEPAppStored::TextList ? kAnyCount : 1;
+      rule.count = kind == ZEPAppStored::TextList ? kAnyCount : 1;
       rules.push_back(std::move(rule));
       continue;
     }
