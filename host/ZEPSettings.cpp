@@ -126,7 +126,19 @@ template <class T> int ZEPSysSettingRepository::Store(const char* iName, std::ve
   }
   _user[iName] = std::move(values);
   _modified = true;
+  NoteWrite(iName);
   return 1;
+}
+
+void ZEPSysSettingRepository::NoteWrite(const char* iName) {
+  // Past a few dozen names, comparing every value is as quick as looking each one up.
+  constexpr std::size_t kKept = 64;
+  if (!_writtenKnown) return;
+  if (_written.size() < kKept) _written.emplace_back(iName);
+  else {
+    _written.clear();
+    _writtenKnown = false;
+  }
 }
 
 int ZEPSysSettingRepository::ReadAttr(const char* n, double* v, int c) const { return Read(n, v, c); }
@@ -179,17 +191,22 @@ long ZEPSysSettingRepository::GetLockInfo(const std::string& iName, ZEPSettingIn
 
 int ZEPSysSettingRepository::ResetAttr(const std::string& iName) {
   if (IsLocked(iName)) return 0;
-  if (_user.erase(iName)) _modified = true;
+  if (_user.erase(iName)) {
+    _modified = true;
+    NoteWrite(iName.c_str());
+  }
   return 1;
 }
 
 void ZEPSysSettingRepository::SetUserValue(const std::string& iName, const Value& iValue) {
+  _writtenKnown = false;
   // Loading gives the names in order: then the value goes at the end without a search.
   if (_user.empty() || _user.rbegin()->first < iName) _user.emplace_hint(_user.end(), iName, iValue);
   else _user[iName] = iValue;
 }
 
 void ZEPSysSettingRepository::SetUserValues(std::map<std::string, Value>&& iValues) {
+  _writtenKnown = false;
   if (_user.empty()) _user.swap(iValues);
   else
     for (auto& [name, value] : iValues) _user.insert_or_assign(name, std::move(value));

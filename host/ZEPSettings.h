@@ -113,6 +113,16 @@ public:
   void SetUserValues(std::map<std::string, Value>&& iValues);
 
   const std::map<std::string, Value>& UserValues() const { return _user; }
+  // The names of the user's values written or reset (WriteAttr, ResetAttr) since ForgetWrites,
+  // in the order of the writes, possibly repeated: where a store looks for what changed rather
+  // than comparing every value. Null when that is not known: before the first ForgetWrites,
+  // after loading (SetUserValue, SetUserValues), or once more were written than are kept.
+  const std::vector<std::string>* Written() const { return _writtenKnown ? &_written : nullptr; }
+  // Starts the list again, empty; iKeep false: no list is kept until the next ForgetWrites.
+  void ForgetWrites(bool iKeep = true) {
+    _written.clear();
+    _writtenKnown = iKeep;
+  }
   const std::map<std::string, Value>& Defaults() const { return _defaults; }
   const std::map<std::string, Lock>& Locks() const { return _locks; }
   // The value a read answers (administrator's when locked, else user's, else default); null if none.
@@ -126,6 +136,7 @@ protected:
   template <class T> int Read(const char* iName, T* oValues, int iCount) const;
   template <class T> int Write(const char* iName, const T* iValues, int iCount);
   template <class T> int Store(const char* iName, std::vector<T>&& iValues);
+  void NoteWrite(const char* iName);
 
 private:
   std::string _name;
@@ -133,6 +144,8 @@ private:
   std::map<std::string, Value> _defaults;
   std::map<std::string, Lock> _locks;
   bool _modified = false;
+  std::vector<std::string> _written;
+  bool _writtenKnown = false;
   std::function<long(ZEPSysSettingRepository&)> _saveHandler;
 };
 

@@ -5,12 +5,14 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
+#include <algorithm>
 #include <cfloat>
 #include <climits>
 #include <cmath>
 #include <fstream>
 #include <iterator>
 #include <random>
+#include <tuple>
 
 using namespace zepapp;
 
@@ -218,4 +220,70 @@ TEST(SettingsText, QuickReadingAnswersAsTheThoroughOne) {
     ExpectSameReading(text, round % 2 == 0);
     if (HasFailure()) return;
   }
+}
+
+TEST(SettingsText, EntriesRewrittenInPlaceGiveTheWholeTextWrittenAgain) {
+  std::mt19937 random(77u);
+  auto spans = [](const ZEPAppTextLayout& l) {
+    std::vector<std::tuple<ZEPAppRepoKind, std::string, std::string, std::size_t, std::size_t>> out;
+    for (const ZEPAppEntrySpan& s : l) out.emplace_back(s.kind, *s.repo, *s.attr, s.begin, s.end);
+    return out;
+  };
+  int updated = 0, refused = 0;
+  for (int round = 0; round < 300; ++round) {
+    ZEPAppSettingsDoc doc = RandomDoc(random);
+    const ZEPAppSettingsDoc other = RandomDoc(random); // where new values come from
+    std::vector<const ZEPAppAttrEntry*> pool;
+    for (const auto& repos : {other.settings, other.preferences})
+      for (const auto& [repo, entries] : repos)
+        for (const auto& [attr, entry] : entries) pool.push_back(&entry);
+    const bool admin = round % 2 == 0;
+    std::string text, err;
+    ZEPAppTextLayout layout;
+    ASSERT_TRUE(FormatSettingsText(doc, admin, text, err, &layout)) << err;
+    // Some written entries take another entry's value, kind, count and lock.
+    std::vector<ZEPAppEntryRef> changed;
+    bool writable = true;
+    for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference})
+      for (auto& [repo, entries] : doc.Of(kind))
+        for (auto& [attr, entry] : entries) {
+          const bool written =
+              std::any_of(layout.begin(), layout.end(), [&](const ZEPAppEntrySpan& s) { return s.attr == &attr; });
+          if (!written || pool.empty() || random() % 3 != 0) continue;
+          entry = *pool[random() % pool.size()];
+          if (random() % 25 == 0) entry.value = std::vector<double>{NAN};
+          writable = writable && (entry.value || (admin && (entry.locked || !entry.by.empty()))) &&
+                     !(entry.value && !Unstorable(*entry.value).empty());
+          changed.push_back({kind, repo, attr, entry});
+        }
+    const std::string before = text;
+    const auto layoutBefore = spans(layout);
+    std::string next;
+    const bool done = UpdateSettingsText(text, layout, changed, admin, next);
+    ASSERT_EQ(writable, done);
+    if (!done) { // nothing moved: the whole document is formatted instead
+      ++refused;
+      EXPECT_EQ(layoutBefore, spans(layout));
+      continue;
+    }
+    ++updated;
+    std::string whole;
+    ZEPAppTextLayout wholeLayout;
+    ASSERT_TRUE(FormatSettingsText(doc, admin, whole, err, &wholeLayout)) << err;
+    ASSERT_EQ(whole, next);
+    ASSERT_EQ(spans(wholeLayout), spans(layout));
+    EXPECT_EQ(before, text);
+  }
+  EXPECT_GT(updated, 100);
+  EXPECT_GT(refused, 5);
+  // An attribute the text does not hold is not guessed at.
+  ZEPAppSettingsDoc doc;
+  doc.settings["R"]["A"].value = std::vector<int>{1};
+  std::string text, err, next;
+  ZEPAppTextLayout layout;
+  ASSERT_TRUE(FormatSettingsText(doc, false, text, err, &layout));
+  ZEPAppAttrEntry& added = doc.settings["R"]["B"];
+  added.value = std::vector<int>{2};
+  EXPECT_FALSE(UpdateSettingsText(text, layout, {{ZEPAppRepoKind::Setting, "R", "B", added}}, false, next));
+  EXPECT_FALSE(UpdateSettingsText(text, layout, {{ZEPAppRepoKind::Preference, "R", "A", added}}, false, next));
 }

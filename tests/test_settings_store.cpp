@@ -14,6 +14,7 @@
 #include <fstream>
 #include <iterator>
 #include <map>
+#include <random>
 #include <sstream>
 
 #include <sys/stat.h>
@@ -419,4 +420,84 @@ TEST_F(SettingsStore, DispatchSurvivesCallbacksThatUnsubscribeOrDestroy) {
     EXPECT_EQ(expected[range - 1], sketcher.GetGridPrimSpac(static_cast<ZEPCkeScale>(range))) << range;
     EXPECT_EQ(expectedSteps[range - 1], sketcher.GetGridVSecStep(static_cast<ZEPCkeScale>(range))) << range;
   }
+}
+
+// Saves after the first rewrite only the entries they change: whatever a run does, each save
+// leaves the file a whole save would write, holding what the run and other writers set.
+TEST_F(SettingsStore, SavesInOneRunWriteWhatAWholeSaveWrites) {
+  std::mt19937 random(5u);
+  auto name = [](int k) { return "Attr" + std::to_string(k); };
+  std::map<std::string, ZEPAppValue> expected; // the repository's part of the file
+  std::map<std::string, int> foreign;          // what another process keeps in another repository
+  auto check = [&](int step) {
+    SCOPED_TRACE("step " + std::to_string(step));
+    const std::string text = ReadBytes(_user);
+    ZEPAppSettingsDoc doc;
+    ASSERT_TRUE(ParseSettingsText(text, _u, false, doc).empty()) << text;
+    std::string whole, err;
+    ASSERT_TRUE(FormatSettingsText(doc, false, whole, err)) << err;
+    ASSERT_EQ(whole, text);
+    std::map<std::string, ZEPAppValue> mine;
+    for (const auto& [attr, entry] : doc.settings["R"]) mine.emplace(attr, *entry.value);
+    ASSERT_EQ(expected, mine);
+    for (const auto& [attr, v] : foreign) ASSERT_EQ(ZEPAppValue(std::vector<int>{v}), *doc.settings["Other"][attr].value);
+  };
+  ZEPAppSettingsFile store;
+  ASSERT_EQ(S_OK, store.Load(_u));
+  ZEPSysSettingRepository* repo = store.OpenSettings("R");
+  for (int step = 0; step < 60; ++step) {
+    const std::string attr = name(static_cast<int>(random() % 12));
+    switch (random() % 6) {
+    case 0: case 1: { // a value of another kind or count now and then
+      const int v = static_cast<int>(random() % 1000) - 500;
+      if (random() % 2) {
+        ASSERT_EQ(1, repo->WriteAttr(attr.c_str(), &v, 1));
+        expected[attr] = std::vector<int>{v};
+      } else {
+        const double d[3] = {v / 8.0, 0.1, -1e-7};
+        const int n = 1 + static_cast<int>(random() % 3);
+        ASSERT_EQ(1, repo->WriteAttr(attr.c_str(), d, n));
+        expected[attr] = std::vector<double>(d, d + n);
+      }
+      break;
+    }
+    case 2: { // a text that needs escapes
+      const std::vector<std::string> texts = {"a\"b\\c\n" + attr, "\xE6\x97\xA5"};
+      ASSERT_EQ(1, repo->WriteAttr(attr.c_str(), texts));
+      expected[attr] = texts;
+      break;
+    }
+    case 3:
+      ASSERT_EQ(S_OK, store.Reset("R", attr));
+      expected.erase(attr);
+      break;
+    case 4: { // more writes at once than the repository keeps track of
+      for (int k = 0; k < 80; ++k) {
+        const int v = step * 100 + k;
+        ASSERT_EQ(1, repo->WriteAttr(("Many" + std::to_string(k)).c_str(), &v, 1));
+        expected["Many" + std::to_string(k)] = std::vector<int>{v};
+      }
+      break;
+    }
+    default: { // another process saves meanwhile
+      ZEPAppSettingsDoc doc;
+      ParseSettingsText(ReadBytes(_user), _u, false, doc);
+      const std::string key = "F" + std::to_string(random() % 4);
+      foreign[key] = step;
+      doc.settings["Other"][key].value = std::vector<int>{step};
+      std::string text, err;
+      ASSERT_TRUE(FormatSettingsText(doc, false, text, err));
+      WriteBytes(_user, text);
+      continue;
+    }
+    }
+    ASSERT_EQ(S_OK, repo->SaveRepository()) << store.LastError();
+    check(step);
+    if (HasFailure()) return;
+  }
+  // A second run reads back what the last save wrote.
+  ZEPSysSettingRepository::CloseAll();
+  ZEPAppSettingsFile again;
+  ASSERT_EQ(S_OK, again.Load(_u));
+  EXPECT_EQ(expected, again.OpenSettings("R")->UserValues());
 }

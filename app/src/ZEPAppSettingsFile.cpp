@@ -1,5 +1,6 @@
 #include "ZEPAppSettingsFile.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cstdlib>
 #include <cstring>
@@ -125,6 +126,9 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     bool onDisk = false;
     std::optional<ZEPAppFileError> fault; // set when it could not be read: never written then
     std::set<AttrKey> unusable;           // values reported and not applied
+    // Where each attribute of doc lies in bytes, when bytes were written from doc by this run
+    // (empty otherwise): a save then rewrites only the entries it changes.
+    ZEPAppTextLayout layout;
   };
 
   std::shared_ptr<ZEPAppFileOps> ops;
@@ -283,6 +287,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
         quickLoad = false;
       }
       ioFile.doc = ZEPAppSettingsDoc();
+      ioFile.layout.clear();
       ioFile.parsed = true;
       ioFile.bytes = std::move(bytes);
       ioFile.onDisk = onDisk;
@@ -299,6 +304,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
       }
     } catch (const std::exception& ex) { // out of memory and the like: still a report, not a crash
       ioFile.doc = ZEPAppSettingsDoc();
+      ioFile.layout.clear();
       ioFile.parsed = true;
       ioFile.bytes.clear();
       if (oValues) *oValues = ZEPAppSettingsValues();
@@ -308,7 +314,10 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     ioFile.fault = oFaults.front();
     // A faulty user's file contributes nothing rather than half of itself; the readable part of
     // an administrator's file keeps its locks.
-    if (!iAdmin) ioFile.doc = ZEPAppSettingsDoc();
+    if (!iAdmin) {
+      ioFile.doc = ZEPAppSettingsDoc();
+      ioFile.layout.clear();
+    }
     return false;
   }
 
@@ -333,6 +342,9 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
   void Apply(ZEPAppRepoKind iKind, ZEPSysSettingRepository& ioRepo) {
     const RepoKey key{iKind, ioRepo.GetName()};
     baseline.erase(key); // what it is given is the user's document's usable values again
+    // Given to an empty repository, the values are what it holds: from here on its writes tell
+    // what changed. Merged into values it held, they are not.
+    const bool holdsGiven = ioRepo.UserValues().empty();
     auto& staged = loaded.Of(iKind);
     auto it = staged.find(key.second);
     if (it != staged.end() && !handedOut.count(key)) { // from a quick load: moved, not copied
@@ -344,6 +356,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
         for (const auto& [attr, entry] : repo->second) // in order: each insertion goes at the end
           if (entry.value && !Unusable(key, attr)) ioRepo.SetUserValue(attr, *entry.value);
     }
+    ioRepo.ForgetWrites(holdsGiven);
     const auto& admins = admin.doc.Of(iKind);
     if (auto it = admins.find(ioRepo.GetName()); it != admins.end())
       for (const auto& [attr, entry] : it->second) {
@@ -406,7 +419,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
 
   // The save handler: the attributes of this repository changed by this run, written over what
   // the file holds now.
-  long SaveUser(ZEPAppRepoKind iKind, const ZEPSysSettingRepository& iRepo) {
+  long SaveUser(ZEPAppRepoKind iKind, ZEPSysSettingRepository& iRepo) {
     lastError.clear();
     if (user.path.empty())
       return Fail("the settings cannot be saved: no settings file is known (set HOME, XDG_CONFIG_HOME or " +
@@ -419,7 +432,10 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     std::vector<Change> changes = ChangesOf(key, iRepo);
     if (user.fault) return Fail(user.path + " is not saved because it could not be read again (" +
                                 user.fault->Text() + ")");
-    if (changes.empty()) return S_OK;
+    if (changes.empty()) {
+      if (iRepo.Written()) iRepo.ForgetWrites(); // written back as they were: nothing differs
+      return S_OK;
+    }
 
     // Should another process have written the file meanwhile, what the repository was given
     // is kept apart as its document is replaced: the changes stay what they are.
@@ -430,18 +446,31 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     auto repo = repos.find(iRepo.GetName());
     if (repo == repos.end()) repo = repos.emplace(iRepo.GetName(), ZEPAppRepoEntries()).first;
     ZEPAppRepoEntries& entries = repo->second;
+    // Values replaced where they are can be rewritten in the text where they are; an attribute
+    // added or removed moves everything after it.
+    bool inPlace = true;
+    std::vector<ZEPAppEntryRef> rewritten;
+    rewritten.reserve(changes.size());
     ForEachPlace(entries, changes, [&](ZEPAppRepoEntries::iterator& ioAt, const Change& c) {
       const bool there = ioAt != entries.end() && ioAt->first == c.name;
       if (c.value) {
-        if (!there) ioAt = entries.emplace_hint(ioAt, c.name, ZEPAppAttrEntry());
+        if (!there) {
+          ioAt = entries.emplace_hint(ioAt, c.name, ZEPAppAttrEntry());
+          inPlace = false;
+        }
         ioAt->second.value = *c.value; // a value of the same kind and count keeps its storage
+        rewritten.push_back({iKind, repo->first, ioAt->first, ioAt->second});
         ++ioAt;
-      } else if (there) ioAt = entries.erase(ioAt);
+      } else if (there) {
+        ioAt = entries.erase(ioAt);
+        inPlace = false;
+      }
     });
     if (entries.empty()) repos.erase(repo);
-    if (long rc = WriteDoc(user, false); FAILED(rc)) {
+    if (long rc = WriteDoc(user, false, inPlace ? &rewritten : nullptr); FAILED(rc)) {
       // The file holds what it held: its document is read from those bytes again when needed.
       user.doc = ZEPAppSettingsDoc();
+      user.layout.clear();
       user.parsed = false;
       return rc;
     }
@@ -461,6 +490,7 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     if (!user.unusable.empty())
       for (const Change& c : changes) user.unusable.erase({iKind, iRepo.GetName(), c.name});
     erased[key].clear();
+    if (iRepo.Written()) iRepo.ForgetWrites(); // it holds what it was given again
     return S_OK;
   }
 
@@ -474,23 +504,39 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
   std::vector<Change> ChangesOf(const RepoKey& iKey, const ZEPSysSettingRepository& iRepo) {
     const std::map<std::string, ZEPAppValue>& now = iRepo.UserValues();
     const std::set<std::string>& reset = erased[iKey];
+    const std::vector<std::string>* written = iRepo.Written();
     if (auto kept = baseline.find(iKey); kept != baseline.end())
-      return Changes(kept->second, [](const auto& e) { return &e.second; }, now, reset);
+      return Changes(kept->second, [](const auto& e) { return &e.second; }, now, reset, written);
     static const ZEPAppRepoEntries kNothing;
     const auto& repos = Doc(user).Of(iKey.first);
     auto repo = repos.find(iKey.second);
     return Changes(repo == repos.end() ? kNothing : repo->second,
                    [&](const auto& e) { return e.second.value && !Unusable(iKey, e.first) ? &*e.second.value : nullptr; },
-                   now, reset);
+                   now, reset, written);
   }
 
   // What differs between what the repository was given (the elements of iBefore that iGiven
   // answers a value for) and what it holds now, and what was reset since, in name order. One
-  // pass over both (they are ordered alike).
+  // pass over both (they are ordered alike), or, when iWritten lists every name written since
+  // the repository held what it was given, a look at those names only.
   template <class Before, class Given>
   static std::vector<Change> Changes(const Before& iBefore, Given iGiven, const std::map<std::string, ZEPAppValue>& iNow,
-                                     const std::set<std::string>& iErased) {
+                                     const std::set<std::string>& iErased, const std::vector<std::string>* iWritten) {
     std::vector<Change> changes;
+    if (iWritten) {
+      std::vector<std::string> names(*iWritten);
+      names.insert(names.end(), iErased.begin(), iErased.end());
+      std::sort(names.begin(), names.end());
+      names.erase(std::unique(names.begin(), names.end()), names.end());
+      for (const std::string& name : names) {
+        auto b = iBefore.find(name);
+        const ZEPAppValue* given = b == iBefore.end() ? nullptr : iGiven(*b);
+        auto n = iNow.find(name);
+        if (n != iNow.end() ? !given || !(*given == n->second) : given || iErased.count(name))
+          changes.push_back({name, n == iNow.end() ? nullptr : &n->second});
+      }
+      return changes;
+    }
     auto b = iBefore.begin();
     auto n = iNow.begin();
     for (;;) {
@@ -536,12 +582,22 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     }
   }
 
-  // Writes what ioFile.doc holds.
-  long WriteDoc(File& ioFile, bool iAdmin) {
+  // Writes what ioFile.doc holds. iChanged: when only those entries changed, and in place,
+  // since ioFile.bytes were written from the document, only they are written again in the text.
+  long WriteDoc(File& ioFile, bool iAdmin, const std::vector<ZEPAppEntryRef>* iChanged = nullptr) {
     std::string text, err;
-    if (!FormatSettingsText(ioFile.doc, iAdmin, text, err)) return Fail(ioFile.path + ": " + err);
+    // Moved to where the entries lie in text; given up should the write fail.
+    if (!(iChanged && !ioFile.layout.empty() && ioFile.onDisk &&
+          UpdateSettingsText(ioFile.bytes, ioFile.layout, *iChanged, iAdmin, text)) &&
+        !FormatSettingsText(ioFile.doc, iAdmin, text, err, &ioFile.layout)) {
+      ioFile.layout.clear();
+      return Fail(ioFile.path + ": " + err);
+    }
     if (!(ioFile.onDisk && text == ioFile.bytes)) {
-      if (FAILED(WriteFileAtomically(*ops, ioFile.path, text, err))) return Fail(err);
+      if (FAILED(WriteFileAtomically(*ops, ioFile.path, text, err))) {
+        ioFile.layout.clear();
+        return Fail(err);
+      }
       ioFile.bytes = std::move(text);
       ioFile.onDisk = true;
       if (&ioFile == &user) quickLoad = false;

@@ -770,7 +770,8 @@ namespace {
 // writes them), so that stored files keep their bytes. One pass, no search per key.
 class SettingsWriter {
 public:
-  explicit SettingsWriter(std::string& oText) : _out(oText) {}
+  // iDepth: how deep what is written is nested (an attribute's object: 3).
+  explicit SettingsWriter(std::string& oText, int iDepth = 0) : _out(oText), _depth(iDepth) {}
 
   void Open(char iBracket) { _out += iBracket; ++_depth; _first = true; }
   void Close(char iBracket) {
@@ -838,7 +839,7 @@ private:
   }
 
   std::string& _out;
-  int _depth = 0;
+  int _depth;
   bool _first = true;
 };
 
@@ -848,14 +849,58 @@ template <class T> const char* TypeName() {
          : std::is_same_v<T, unsigned int> ? "unsigned"
                                            : "text";
 }
+
+// Whether an attribute has something to write: a value, or (the administrator's file) a lock or
+// its author.
+bool Writes(const ZEPAppAttrEntry& iEntry, bool iAdmin) {
+  return iEntry.value || (iAdmin && (iEntry.locked || !iEntry.by.empty()));
+}
+
+// Writes an attribute's object, "{" to "}".
+void WriteEntry(SettingsWriter& w, const ZEPAppAttrEntry& iEntry, bool iAdmin) {
+  w.Open('{');
+  if (iEntry.value)
+    std::visit(
+        [&](const auto& values) {
+          using T = typename std::decay_t<decltype(values)>::value_type;
+          w.Key(TypeName<T>());
+          if (values.size() == 1) return w.Number(values.front());
+          w.Open('[');
+          for (const T& v : values) {
+            w.Element();
+            w.Number(v);
+          }
+          w.Close(']');
+        },
+        *iEntry.value);
+  if (iAdmin && iEntry.locked) {
+    w.Key("locked");
+    w.Bool(true);
+  }
+  if (iAdmin && !iEntry.by.empty()) {
+    w.Key("by");
+    w.String(iEntry.by);
+  }
+  w.Close('}');
+}
+
+// Text order of layout spans: sections, then repositories and attributes in map order.
+bool Before(const ZEPAppEntrySpan& iSpan, const ZEPAppEntryRef& iRef) {
+  if (iSpan.kind != iRef.kind) return iSpan.kind < iRef.kind;
+  if (const int c = iSpan.repo->compare(iRef.repo); c != 0) return c < 0;
+  return *iSpan.attr < iRef.attr;
+}
 } // namespace
 
-bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError) {
+bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError,
+                        ZEPAppTextLayout* oLayout) {
   std::string text;
+  ZEPAppTextLayout layout;
   std::size_t attributes = 0;
   for (ZEPAppRepoKind kind : {ZEPAppRepoKind::Setting, ZEPAppRepoKind::Preference})
     for (const auto& repo : iDoc.Of(kind)) attributes += repo.second.size();
   text.reserve(64 + 96 * attributes);
+  if (oLayout) layout.reserve(attributes);
   SettingsWriter w(text);
   w.Open('{');
   w.Key("format");
@@ -877,38 +922,16 @@ bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string&
             oError = std::string(section) + "/" + repo + "/" + attr + " cannot be saved: " + why;
             return false;
           }
-        const bool locked = iAdmin && entry.locked, by = iAdmin && !entry.by.empty();
-        if (!entry.value && !locked && !by) continue; // an attribute with nothing to write is left out
+        if (!Writes(entry, iAdmin)) continue; // an attribute with nothing to write is left out
         if (!repoOpen) {
           w.Key(repo);
           w.Open('{');
           repoOpen = true;
         }
         w.Key(attr);
-        w.Open('{');
-        if (entry.value)
-          std::visit(
-              [&](const auto& values) {
-                using T = typename std::decay_t<decltype(values)>::value_type;
-                w.Key(TypeName<T>());
-                if (values.size() == 1) return w.Number(values.front());
-                w.Open('[');
-                for (const T& v : values) {
-                  w.Element();
-                  w.Number(v);
-                }
-                w.Close(']');
-              },
-              *entry.value);
-        if (locked) {
-          w.Key("locked");
-          w.Bool(true);
-        }
-        if (by) {
-          w.Key("by");
-          w.String(entry.by);
-        }
-        w.Close('}');
+        const std::size_t begin = text.size();
+        WriteEntry(w, entry, iAdmin);
+        if (oLayout) layout.push_back({kind, &repo, &attr, begin, text.size()});
       }
       if (repoOpen) w.Close('}');
     }
@@ -916,6 +939,58 @@ bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string&
   }
   w.Close('}');
   text += '\n';
+  oText = std::move(text);
+  if (oLayout) *oLayout = std::move(layout);
+  return true;
+}
+
+bool UpdateSettingsText(const std::string& iText, ZEPAppTextLayout& ioLayout,
+                        const std::vector<ZEPAppEntryRef>& iChanged, bool iAdmin, std::string& oText) {
+  if (iChanged.empty()) {
+    oText = iText;
+    return true;
+  }
+  // Each changed entry's new object, and the span it replaces.
+  std::vector<std::pair<std::size_t, std::string>> pieces;
+  pieces.reserve(iChanged.size());
+  auto from = ioLayout.begin();
+  for (const ZEPAppEntryRef& ref : iChanged) {
+    if (!Writes(ref.entry, iAdmin) || (ref.entry.value && !Unstorable(*ref.entry.value).empty())) return false;
+    from = std::lower_bound(from, ioLayout.end(), ref, Before);
+    if (from == ioLayout.end() || from->kind != ref.kind || *from->repo != ref.repo || *from->attr != ref.attr)
+      return false;
+    std::string piece;
+    SettingsWriter w(piece, 3);
+    WriteEntry(w, ref.entry, iAdmin);
+    pieces.emplace_back(static_cast<std::size_t>(from - ioLayout.begin()), std::move(piece));
+    ++from;
+  }
+  // One copy of the text, the new objects in place of the old.
+  std::size_t size = iText.size();
+  for (const auto& [at, piece] : pieces) size = size - (ioLayout[at].end - ioLayout[at].begin) + piece.size();
+  std::string text;
+  text.reserve(size);
+  std::size_t copied = 0;
+  for (const auto& [at, piece] : pieces) {
+    text.append(iText, copied, ioLayout[at].begin - copied);
+    text += piece;
+    copied = ioLayout[at].end;
+  }
+  text.append(iText, copied, std::string::npos);
+  // The spans from the first change on move by what the pieces before them added or took.
+  std::size_t shifted = 0; // modulo arithmetic: the text only grows or shrinks by what it is
+  auto next = pieces.begin();
+  for (std::size_t i = pieces.front().first; i < ioLayout.size(); ++i) {
+    ZEPAppEntrySpan& span = ioLayout[i];
+    std::size_t length = span.end - span.begin;
+    span.begin += shifted;
+    if (next != pieces.end() && next->first == i) {
+      shifted += next->second.size() - length;
+      length = next->second.size();
+      ++next;
+    }
+    span.end = span.begin + length;
+  }
   oText = std::move(text);
   return true;
 }

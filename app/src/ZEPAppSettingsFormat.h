@@ -109,10 +109,39 @@ struct ZEPAppSettingsValues {
 // tells. oValues is complete only on true.
 bool ReadSettingsValues(const std::string& iText, ZEPAppSettingsValues& oValues);
 
+// Where one attribute's object ("{...}", after its key) lies in a text FormatSettingsText wrote.
+// repo and attr point at the keys of the document's maps.
+struct ZEPAppEntrySpan {
+  ZEPAppRepoKind kind;
+  const std::string* repo;
+  const std::string* attr;
+  std::size_t begin, end;
+};
+// The spans of every attribute written, in text order (the order of the document's maps).
+using ZEPAppTextLayout = std::vector<ZEPAppEntrySpan>;
+
 // Writes iDoc in the form above. False with oError when something cannot be written faithfully
 // (a NaN or infinity, a name or text that is not UTF-8, a text holding a NUL); iAdmin keeps
-// locks, else they are left out.
-bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError);
+// locks, else they are left out. oLayout, when given, receives where each attribute was written.
+bool FormatSettingsText(const ZEPAppSettingsDoc& iDoc, bool iAdmin, std::string& oText, std::string& oError,
+                        ZEPAppTextLayout* oLayout = nullptr);
+
+// An attribute of a document, named the way a layout names it.
+struct ZEPAppEntryRef {
+  ZEPAppRepoKind kind;
+  const std::string& repo;
+  const std::string& attr;
+  const ZEPAppAttrEntry& entry;
+};
+// The text FormatSettingsText writes for a document, from iText, written from it with ioLayout,
+// after the entries iChanged (in text order) of that same document changed in place: only
+// those entries are written again, so the cost is a copy of the text rather than a formatting
+// of every value. oText receives the text, and ioLayout is moved to where the entries now lie.
+// False, with both left as they were, when an entry cannot be rewritten where it is (not in the
+// layout, nothing left to write for it, or a value that cannot be written): format the whole
+// document then, which tells what is wrong, if anything.
+bool UpdateSettingsText(const std::string& iText, ZEPAppTextLayout& ioLayout,
+                        const std::vector<ZEPAppEntryRef>& iChanged, bool iAdmin, std::string& oText);
 
 // A message about one place of a file that parsed, named by a JSON pointer
 // ("/settings/DraftingOptions/DrwViewAxisLength/double"); atKey: the member's key rather than
