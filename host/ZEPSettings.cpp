@@ -119,12 +119,15 @@ template <class T> int ZEPSysSettingRepository::Write(const char* iName, const T
 }
 
 template <class T> int ZEPSysSettingRepository::Store(const char* iName, std::vector<T>&& values) {
-  auto it = _user.find(iName);
-  if (it != _user.end()) {
-    const std::vector<T>* old = std::get_if<std::vector<T>>(&it->second);
+  auto it = _user.lower_bound(iName);
+  if (it != _user.end() && it->first == iName) {
+    std::vector<T>* old = std::get_if<std::vector<T>>(&it->second);
     if (old && *old == values) return 1;
+    if (old) old->swap(values);
+    else it->second = std::move(values);
+  } else {
+    _user.emplace_hint(it, iName, std::move(values));
   }
-  _user[iName] = std::move(values);
   _modified = true;
   NoteWrite(iName);
   return 1;

@@ -956,7 +956,8 @@ bool UpdateSettingsText(const std::string& iText, ZEPAppTextLayout& ioLayout,
   auto from = ioLayout.begin();
   for (const ZEPAppEntryRef& ref : iChanged) {
     if (!Writes(ref.entry, iAdmin) || (ref.entry.value && !Unstorable(*ref.entry.value).empty())) return false;
-    from = std::lower_bound(from, ioLayout.end(), ref, Before);
+    // Changes come in text order, often one after another: the next span first, then a search.
+    if (from == ioLayout.end() || from->attr != &ref.attr) from = std::lower_bound(from, ioLayout.end(), ref, Before);
     if (from == ioLayout.end() || from->kind != ref.kind || *from->repo != ref.repo || *from->attr != ref.attr)
       return false;
     std::string piece;
