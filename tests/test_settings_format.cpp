@@ -234,8 +234,8 @@ TEST(SettingsText, EntriesRewrittenInPlaceGiveTheWholeTextWrittenAgain) {
     ZEPAppSettingsDoc doc = RandomDoc(random);
     const ZEPAppSettingsDoc other = RandomDoc(random); // where new values come from
     std::vector<const ZEPAppAttrEntry*> pool;
-    for (const auto& repos : {other.settings, other.preferences})
-      for (const auto& [repo, entries] : repos)
+    for (const auto* repos : {&other.settings, &other.preferences})
+      for (const auto& [repo, entries] : *repos)
         for (const auto& [attr, entry] : entries) pool.push_back(&entry);
     const bool admin = round % 2 == 0;
     std::string text, err;
