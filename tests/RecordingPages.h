@@ -3,15 +3,15 @@
 
 #include "PageRecorder.h"
 
-#include "ZEP2DBaseOptDimFrm.h"
 #include "ZEP2DBaseOptAdminFrm.h"
 #include "ZEP2DBaseOptAnnotFrm.h"
+#include "ZEP2DBaseOptDimFrm.h"
 #include "ZEP2DBaseOptDisplayFrm.h"
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
-#include "ZEP2DBaseOptManipFrm.h"
 #include "ZEP2DBaseOptMainFrm.h"
+#include "ZEP2DBaseOptManipFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
 
 class RecordingGridPage : public Recording<ZEP2DBaseOptGridFrm> {
@@ -124,9 +124,7 @@ public:
 
 protected:
   ZEPString GetFrameIconName() override { return _script.Answer("GetFrameIconName"); }
-  ZEPUnicodeString GetDefaultStandardName() override {
-    return _script.Answer("GetDefaultStandardName");
-  }
+  ZEPUnicodeString GetDefaultStandardName() override { return _script.Answer("GetDefaultStandardName"); }
 #define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptMainFrm, Name, Kind)
 #include "ZEP2DBaseOptMainFrm.def"
 #undef ZEP_SETTING
@@ -185,8 +183,7 @@ public:
       : Recording<ZEP2DBaseOptDisplayFrm>(iScript, iParent, "DisplayPage") {}
   void Build() {
     nextRow = static_cast<int>(_script.Option("FirstRow", 0));
-    ZEP2DBaseOptDisplayFrm::Build(nextRow,
-                                  static_cast<unsigned char>(_script.Option("WithTrackHistory", 1)));
+    ZEP2DBaseOptDisplayFrm::Build(nextRow, static_cast<unsigned char>(_script.Option("WithTrackHistory", 1)));
   }
   int nextRow = 0;
 
@@ -267,8 +264,7 @@ protected:
   // The first number of every call of iHook, in order.
   std::vector<double> Written(const std::string& iHook) {
     std::vector<double> values;
-    for (const HookCall& call : _script.Calls(iHook))
-      values.push_back(call.values.at(0));
+    for (const HookCall& call : _script.Calls(iHook)) values.push_back(call.values.at(0));
     return values;
   }
   // Presses the push button and answers the dialog of that name it opened.

@@ -18,12 +18,9 @@ protected:
   void ScriptEveryPart() {
     _script.allInfoSet = true;
     _script.storeWrites = true;
-    _script.textLists = {{"StandardPLMList", {"Company A", "Company B"}},
-                         {"StandardPLMIDList", {"key-a", "key-b"}}};
+    _script.textLists = {{"StandardPLMList", {"Company A", "Company B"}}, {"StandardPLMIDList", {"key-a", "key-b"}}};
     _script.texts = {{"StandardName", "key-a"}};
-    _script.values = {{"IsStandardPLM", {1}},
-                      {"InsertDrawing", {1}},
-                      {"ScaleRatio", {0.5, 100, 10000, 0.01, 0.0001}}};
+    _script.values = {{"IsStandardPLM", {1}}, {"InsertDrawing", {1}}, {"ScaleRatio", {0.5, 100, 10000, 0.01, 0.0001}}};
   }
   // A fresh page in a window of its own, built: the rows it used.
   int Build() {
@@ -59,8 +56,7 @@ protected:
   std::string Written(const char* iHook) {
     auto calls = _script.Calls(iHook);
     if (calls.empty()) return "(not written)";
-    return calls.back().values.empty() ? calls.back().text
-                                       : std::to_string(int(calls.back().values[0]));
+    return calls.back().values.empty() ? calls.back().text : std::to_string(int(calls.back().values[0]));
   }
 };
 } // namespace
@@ -87,8 +83,7 @@ TEST_F(MainPage, EachOptionalPartExistsExactlyWhenItsInfoHookDoesNotFail) {
       _script.info = {{part.attribute, status}};
       const int rows = Build();
       const bool present = status >= 0;
-      EXPECT_EQ(Find(part.widget) != nullptr, present)
-          << part.attribute << " " << status;
+      EXPECT_EQ(Find(part.widget) != nullptr, present) << part.attribute << " " << status;
       EXPECT_EQ(rows, present ? part.rows : 1) << part.attribute << " " << status;
     }
   // Rows follow each other in the order insert, shareable, scale ratio.
@@ -110,8 +105,8 @@ TEST_F(MainPage, PLMListsThatDoNotPairUpAreDropped) {
   ScriptEveryPart();
   _script.textLists["StandardPLMIDList"] = {"key-a"};
   Open();
-  EXPECT_EQ(Lines(), (Strings{"key-a <I_D3M_Database>", "ANSI <I_D3M_Folder>", "ISO <I_D3M_Folder>",
-                              "JIS <I_D3M_Folder>"}));
+  EXPECT_EQ(Lines(),
+            (Strings{"key-a <I_D3M_Database>", "ANSI <I_D3M_Folder>", "ISO <I_D3M_Folder>", "JIS <I_D3M_Folder>"}));
   EXPECT_FALSE(Enabled("pusStandardPLMRemove"));
 }
 
@@ -190,10 +185,9 @@ TEST_F(MainPage, ValidatedChoiceAddsTheNewStandardsAndMakesTheFirstCurrent) {
   EXPECT_EQ(chooser->GetTypeNames(), Strings{"DIFStandardRep"}); // it offers standards only
   EXPECT_EQ(chooser->GetCommand()->GetFather(), _pPage);
 
-  ASSERT_TRUE(ZEPPLMSetup::Validate(
-      {{"Ünïcode std", "key-c"}, {"Company D", "key-d"}, {"Renamed A", "key-a"}}));
-  EXPECT_EQ(Hooks(), (Strings{"SetSysStandardPLMList", "SetSysStandardPLMIDList",
-                              "SetSysStandardName", "SetSysIsStandardPLM"}));
+  ASSERT_TRUE(ZEPPLMSetup::Validate({{"Ünïcode std", "key-c"}, {"Company D", "key-d"}, {"Renamed A", "key-a"}}));
+  EXPECT_EQ(Hooks(),
+            (Strings{"SetSysStandardPLMList", "SetSysStandardPLMIDList", "SetSysStandardName", "SetSysIsStandardPLM"}));
   EXPECT_EQ(Written("SetSysStandardPLMList"), "Company A\nCompany B\nÜnïcode std\nCompany D\n");
   EXPECT_EQ(Written("SetSysStandardPLMIDList"), "key-a\nkey-b\nkey-c\nkey-d\n");
   EXPECT_EQ(Written("SetSysStandardName"), "key-c");
@@ -324,10 +318,9 @@ TEST_F(MainPage, RatioEntriesAreStoredForTheShownRangeWithinItsTolerances) {
     const char* typed;
     const char* shown;
     double stored; // 0: refused
-  } entries[] = {{"1:50", "1:50", 0.02}, {"1/4", "1:4", 0.25},        {"2", "2:1", 2.0},
-                 {"0.75", "3:4", 0.75},  {"abc", "3:4", 0},           {"1:0", "3:4", 0},
-                 {"1:100000", "3:4", 0}, {"1:1000", "1:1000", 0.001}, {"1000", "1000:1", 1000.0},
-                 {"1001", "1000:1", 0}};
+  } entries[] = {{"1:50", "1:50", 0.02},     {"1/4", "1:4", 0.25}, {"2", "2:1", 2.0},      {"0.75", "3:4", 0.75},
+                 {"abc", "3:4", 0},          {"1:0", "3:4", 0},    {"1:100000", "3:4", 0}, {"1:1000", "1:1000", 0.001},
+                 {"1000", "1000:1", 1000.0}, {"1001", "1000:1", 0}};
   for (const auto& e : entries) {
     _script.calls.clear();
     ASSERT_TRUE(ZEPDlgDriver::EnterText(ratio, e.typed));
@@ -337,8 +330,7 @@ TEST_F(MainPage, RatioEntriesAreStoredForTheShownRangeWithinItsTolerances) {
       continue;
     }
     ASSERT_EQ(Hooks(), Strings{"SetSysScaleRatio"}) << e.typed;
-    EXPECT_EQ(_script.calls[0].values, (std::vector<double>{e.stored, 100, 10000, 0.01, 0.0001}))
-        << e.typed;
+    EXPECT_EQ(_script.calls[0].values, (std::vector<double>{e.stored, 100, 10000, 0.01, 0.0001})) << e.typed;
   }
   // Another range shows its own ratio and bounds, and writes nothing.
   _script.calls.clear();
@@ -388,8 +380,7 @@ TEST_F(MainPage, ShareableFollowsInsertDrawingButItsLockWins) {
   EXPECT_FALSE(Enabled("chkMakeDrawingShareable"));
   ASSERT_TRUE(Click("chkInsertDrawing"));
   ASSERT_TRUE(Click("chkMakeDrawingShareable"));
-  EXPECT_EQ(Hooks(),
-            (Strings{"SetSysInsertDrawing", "SetSysInsertDrawing", "SetSysMakeDrawingShareable"}));
+  EXPECT_EQ(Hooks(), (Strings{"SetSysInsertDrawing", "SetSysInsertDrawing", "SetSysMakeDrawingShareable"}));
   EXPECT_EQ(Written("SetSysMakeDrawingShareable"), "1");
 }
 
@@ -403,18 +394,15 @@ TEST_F(MainPage, EachLockStopsItsOwnControlsOnly) {
                {"InsertDrawing", {"chkInsertDrawing"}},
                {"MakeDrawingShareable", {"chkMakeDrawingShareable"}},
                {"ScaleRatio", {"edtScaleRatio", "cmbRatioRange"}}};
-  const Strings all = {"cmbStandardName",  "pusStandardPLMAdd",       "pusStandardPLMRemove",
-                       "chkInsertDrawing", "chkMakeDrawingShareable", "edtScaleRatio",
-                       "cmbRatioRange"};
+  const Strings all = {"cmbStandardName",         "pusStandardPLMAdd", "pusStandardPLMRemove", "chkInsertDrawing",
+                       "chkMakeDrawingShareable", "edtScaleRatio",     "cmbRatioRange"};
   for (const auto& lock : locks) {
     ScriptEveryPart();
     _script.locked = {lock.attribute};
     Open();
     for (const std::string& name : all) {
-      const bool stopped =
-          std::find(lock.stopped.begin(), lock.stopped.end(), name) != lock.stopped.end();
-      EXPECT_EQ(Enabled(name.c_str()), !stopped)
-          << lock.attribute << " " << name;
+      const bool stopped = std::find(lock.stopped.begin(), lock.stopped.end(), name) != lock.stopped.end();
+      EXPECT_EQ(Enabled(name.c_str()), !stopped) << lock.attribute << " " << name;
     }
   }
 }

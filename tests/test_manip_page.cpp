@@ -53,8 +53,8 @@ TEST_F(ManipPage, EveryMatrixCellWritesItsOwnAttribute) {
     const bool dimension = i < ZEP2DBaseOptManipFrm::kDimensionRows;
     for (int column : {0, 1}) {
       const int slot = column ? rows[i].modSlot : rows[i].creSlot;
-      const std::string name = std::string(dimension ? "_checkDim" : "_check") + rows[i].name +
-                               (column ? "Mod" : "Cre");
+      const std::string name =
+          std::string(dimension ? "_checkDim" : "_check") + rows[i].name + (column ? "Mod" : "Cre");
       ZEPDialog* check = Control(name);
       ASSERT_NE(check, nullptr) << name;
       // The cell sits in its row's grid row, in the check column of its side.
@@ -81,8 +81,7 @@ TEST_F(ManipPage, EveryMatrixCellWritesItsOwnAttribute) {
   EXPECT_TRUE(Find("_checkDimChangeSymbolCre")->GetTitle().IsEmpty());
   EXPECT_FALSE(Find("_labelDimChangeSymbol")->GetLongHelp().IsEmpty());
   EXPECT_EQ(Find("_labelIconDimChangeSymbol"), nullptr);
-  EXPECT_EQ(Find("_labelIconChangeSymbol")->GetChildren().back()->GetIconName(),
-            "S_DrwManipMoveLeader");
+  EXPECT_EQ(Find("_labelIconChangeSymbol")->GetChildren().back()->GetIconName(), "S_DrwManipMoveLeader");
 }
 
 TEST_F(ManipPage, TransparencyIsAPercentRoundedToTheNearestPoint) {
@@ -107,8 +106,7 @@ TEST_F(ManipPage, TransparencyIsAPercentRoundedToTheNearestPoint) {
 }
 
 TEST_F(ManipPage, LengthsInMillimetresAndAnglesInDegreesAtTheHooks) {
-  _script.values = {{"ManipRefSize", {5.0}}, {"RotationSnapAngle", {15.0}},
-                    {"PaperGridSpacing", {0.0}}};
+  _script.values = {{"ManipRefSize", {5.0}}, {"RotationSnapAngle", {15.0}}, {"PaperGridSpacing", {0.0}}};
   Open();
   EXPECT_DOUBLE_EQ(Spinner("editorManipRefSize")->GetValue(), 0.005);
   EXPECT_DOUBLE_EQ(Spinner("spinnerRotSnapAngle")->GetValue(), 0.2617993877991509);
@@ -129,8 +127,8 @@ TEST_F(ManipPage, LengthsInMillimetresAndAnglesInDegreesAtTheHooks) {
 TEST_F(ManipPage, AllInfoHooksAnsweringZero) {
   _script.allInfoSet = true;
   _script.locked = {"DimBlankMod", "ManipTransparency"};
-  _script.values = {{"ManipTransparency", {40}}, {"ManipZoom", {1}}, {"DimChangeSymbolCre", {1}},
-                    {"ManipMovableDatumMod", {1}}};
+  _script.values = {
+      {"ManipTransparency", {40}}, {"ManipZoom", {1}}, {"DimChangeSymbolCre", {1}}, {"ManipMovableDatumMod", {1}}};
   Open();
   EXPECT_FALSE(Enabled("_checkDimBlankMod"));
   EXPECT_FALSE(ZEPDlgDriver::Enter(Control("editorManipTransparency"), 0.5));

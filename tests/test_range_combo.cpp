@@ -8,9 +8,7 @@
 class ZEP2DBaseRangeCmbTest : public ZEPHostTest {
 protected:
   static std::string Name(int iScale) {
-    return ZEPGlobalFunctions2::GetScalesServices()
-        ->GetScaleName(static_cast<ZEPCkeScale>(iScale))
-        .str();
+    return ZEPGlobalFunctions2::GetScalesServices()->GetScaleName(static_cast<ZEPCkeScale>(iScale)).str();
   }
   static std::vector<std::string> Lines(const ZEPDlgCombo& iCombo) {
     std::vector<std::string> lines;
@@ -87,10 +85,8 @@ TEST_F(ZEP2DBaseRangeCmbTest, CurrentScaleOutsideTheRangesSelectsRangeOne) {
 }
 
 TEST_F(ZEP2DBaseRangeCmbTest, MatchingRange) {
-  for (int i : {1, 2, 3, 4})
-    EXPECT_EQ(i, ZEP2DBaseRangeCmb::GetMatchingRange(i));
-  for (int i : {0, -3, 5, 9})
-    EXPECT_EQ(ZEPCkeScaleExtraSmall, ZEP2DBaseRangeCmb::GetMatchingRange(i)) << i;
+  for (int i : {1, 2, 3, 4}) EXPECT_EQ(i, ZEP2DBaseRangeCmb::GetMatchingRange(i));
+  for (int i : {0, -3, 5, 9}) EXPECT_EQ(ZEPCkeScaleExtraSmall, ZEP2DBaseRangeCmb::GetMatchingRange(i)) << i;
 }
 
 TEST_F(ZEP2DBaseRangeCmbTest, BadActivatedListsAndMissingServiceAreReported) {
