@@ -6,12 +6,6 @@
 #include <algorithm>
 
 namespace {
-#define ZEP_SETTING(Name, Kind) #Name,
-const std::vector<std::string> kBehaviors = {
-#include "ZEP2DBaseOptAdminFrm.def"
-};
-#undef ZEP_SETTING
-
 class AdminPage : public PageTest<RecordingAdminPage> {
 protected:
   ZEPDlgDialog* PushBehavior() { return OpenDialog("pushPropTbBehavior", "dlgPropTbBehavior"); }
@@ -225,7 +219,7 @@ TEST_F(AdminPage, BehaviorDialogShowsOnlyRowsWhoseInfoAnswersZero) {
   Open();
   dialog = PushBehavior();
   int rows = 0;
-  for (const std::string& name : kBehaviors) {
+  for (const std::string& name : kAdminAttributes) {
     if (name.rfind("DrwTb", 0) != 0) continue;
     ZEPDialog* combo = Find("cmb" + name, dialog);
     const bool shown = name != "DrwTbBold" && name != "DrwTbPattern";

@@ -7,18 +7,12 @@
 #include <set>
 
 namespace {
-#define ZEP_SETTING(Name, Kind) #Name,
-const char* const kAttributes[] = {
-#include "ZEP2DBaseOptManipFrm.def"
-};
-#undef ZEP_SETTING
-
 using ManipPage = PageTest<RecordingManipPage>;
 } // namespace
 
 TEST_F(ManipPage, ModuleHooksShowZerosAndEveryGetterIsRead) {
   Open(); // the zeros are in the dump
-  EXPECT_EQ(std::set<std::string>(_script.reads.begin(), _script.reads.end()).size(), std::size(kAttributes));
+  EXPECT_EQ(std::set<std::string>(_script.reads.begin(), _script.reads.end()).size(), kManipAttributes.size());
   EXPECT_EQ(ZEPCheckLog::Count(), 0);
   ExpectGolden("manip_page_module_hooks.dump", ZEPDlgDriver::Dump(_pPage));
 }
@@ -64,7 +58,7 @@ TEST_F(ManipPage, EveryMatrixCellWritesItsOwnAttribute) {
       _script.calls.clear();
       ASSERT_TRUE(ZEPDlgDriver::Click(check)) << name;
       ASSERT_EQ(_script.calls.size(), 1u) << name;
-      EXPECT_EQ(_script.calls[0].hook, std::string("SetSys") + kAttributes[slot]) << name;
+      EXPECT_EQ(_script.calls[0].hook, std::string("SetSys") + kManipAttributes[slot]) << name;
       EXPECT_EQ(_script.calls[0].values[0], 1.0) << name;
       ++cells;
     }

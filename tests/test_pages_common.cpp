@@ -23,40 +23,6 @@ struct PageCase {
 };
 void PrintTo(const PageCase& iCase, std::ostream* oStream) { *oStream << iCase.name; }
 
-#define ZEP_SETTING(Name, Kind) #Name,
-const std::vector<std::string> kGridAttributes = {
-#include "ZEP2DBaseOptGridFrm.def"
-};
-const std::vector<std::string> kGalAttributes = {
-#include "ZEP2DBaseOptGalFrm.def"
-};
-const std::vector<std::string> kPrimaryViewAttributes = {
-#include "ZEP2DBasePrimaryViewFrm.def"
-};
-const std::vector<std::string> kDimAttributes = {
-#include "ZEP2DBaseOptDimFrm.def"
-};
-const std::vector<std::string> kGeoAttributes = {
-    // with those of the embedded grid page
-#include "ZEP2DBaseOptGeoFrm.def"
-#include "ZEP2DBaseOptGridFrm.def"
-};
-const std::vector<std::string> kManipAttributes = {
-#include "ZEP2DBaseOptManipFrm.def"
-};
-const std::vector<std::string> kAdminAttributes = {
-#include "ZEP2DBaseOptAdminFrm.def"
-};
-const std::vector<std::string> kMainAttributes = {
-#include "ZEP2DBaseOptMainFrm.def"
-};
-const std::vector<std::string> kAnnotAttributes = {
-#include "ZEP2DBaseOptAnnotFrm.def"
-};
-const std::vector<std::string> kDisplayAttributes = {
-#include "ZEP2DBaseOptDisplayFrm.def"
-};
-#undef ZEP_SETTING
 
 template <class P> ZEPDlgFrame* Opened(HookScript& iScript, ZEPDialog* iParent) {
   return OpenPage<P>(iScript, iParent);
