@@ -254,14 +254,8 @@ protected:
     return on;
   }
   std::vector<std::string> Lines(const std::string& iCombo, ZEPDialog* iIn = nullptr) {
-    std::vector<std::string> out;
     ZEPDlgCombo* combo = Combo(iCombo, iIn);
-    for (int i = 0; combo && i < combo->GetLineCount(); ++i) {
-      ZEPUnicodeString text;
-      combo->GetLine(text, i);
-      out.push_back(text.str());
-    }
-    return out;
+    return combo ? ComboLines(*combo) : std::vector<std::string>{};
   }
   std::vector<std::string> Hooks() { return _script.Hooks(); }
   // The first number of every call of iHook, in order.

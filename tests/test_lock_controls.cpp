@@ -24,23 +24,6 @@ ZEPSettingInfo Locked() {
   return info;
 }
 
-// Counts the notifications a page would receive from one control.
-class Listener : public ZEPDlgFrame {
-public:
-  explicit Listener(ZEPDialog* iParent) : ZEPDlgFrame(iParent, "listener") {}
-  void Listen(ZEPCommand* iSender, ZEPNotification* iNotif) {
-    AddAnalyseNotificationCB(iSender, iNotif, &Listener::OnNotify, nullptr);
-  }
-  int _count = 0;
-  ZEPCommand* _pLastSender = nullptr;
-
-private:
-  void OnNotify(ZEPCommand* iSender, ZEPNotification*, void*) {
-    ++_count;
-    _pLastSender = iSender;
-  }
-};
-
 // A control whose inner control went away: every operation takes its fallback.
 template <class Base> struct Hollow : Base {
   template <class... A> explicit Hollow(A&&... a) : Base(std::forward<A>(a)...) { this->_pDialog = nullptr; }
@@ -97,16 +80,16 @@ TEST_F(LockControls, PadlockDecidesSensitivity) {
   EXPECT_EQ(free->GetSensitivity(), ZEPDlgEnable);
 
   // The user can operate the free control only.
-  Listener listener(&_root);
+  NotificationRecorder listener(&_root); // what a page would hear
   listener.Listen(free->GetDialog(), free->GetSpinnerModifyNotification());
   listener.Listen(locked->GetDialog(), locked->GetSpinnerModifyNotification());
   EXPECT_FALSE(ZEPDlgDriver::Enter(locked->GetDialog(), 0.5));
   EXPECT_EQ(locked->GetValue(), 0.0);
-  EXPECT_EQ(listener._count, 0);
+  EXPECT_TRUE(listener._events.empty());
   EXPECT_EQ(ZEPDlgDriver::WhyNotOperable(locked->GetDialog()), "locked by admin in /etc/drafting/admin.json");
   EXPECT_TRUE(ZEPDlgDriver::Enter(free->GetDialog(), 0.5));
   EXPECT_EQ(free->GetValue(), 0.5);
-  EXPECT_EQ(listener._count, 1);
+  EXPECT_EQ(listener._events.size(), 1u);
   EXPECT_EQ(listener._pLastSender, free->GetDialog());
 
   // Without padlock or inner control the sensitivity reads 16.

@@ -38,15 +38,12 @@ class ScopedEnv {
 public:
   ScopedEnv(const char* iName, const char* iValue) : _name(iName) {
     if (const char* old = std::getenv(iName)) _old = old;
-    if (iValue) setenv(iName, iValue, 1);
-    else unsetenv(iName);
+    Set(iValue);
   }
-  ~ScopedEnv() {
-    if (_old) setenv(_name, _old->c_str(), 1);
-    else unsetenv(_name);
-  }
+  ~ScopedEnv() { Set(_old ? _old->c_str() : nullptr); }
 
 private:
+  void Set(const char* iValue) { iValue ? setenv(_name, iValue, 1) : unsetenv(_name); }
   const char* _name;
   std::optional<std::string> _old;
 };
