@@ -99,18 +99,6 @@ TEST_F(AdminPage, EnvironmentSectionShowsTrueDimensionsWithTheirOwnPadlock) {
   }
 }
 
-// The view name scope radios follow the view name check. (What each radio group shows and
-// writes is a test of every page.)
-TEST_F(AdminPage, ScopeRadiosFollowTheViewNameCheck) {
-  _script.allInfoSet = true;
-  _script.values = {{"ViewNamesUnicity", {1}}};
-  Open();
-  EXPECT_TRUE(Enabled("radViewNameUnicityInSheet"));
-  ASSERT_TRUE(Click("checkViewNamesUnicity"));
-  EXPECT_FALSE(Enabled("radViewNameUnicityInSheet"));
-  EXPECT_FALSE(Enabled("radViewNameUnicityInLayout"));
-}
-
 TEST_F(AdminPage, ScopeRuleOfTheAssemblyWarningsUnderPadlocks) {
   const struct {
     int scope;
@@ -146,11 +134,17 @@ TEST_F(AdminPage, ScopeRuleOfTheAssemblyWarningsUnderPadlocks) {
   EXPECT_FALSE(Enabled("chkShowWarningSelectionOutAssembly"));
 }
 
-TEST_F(AdminPage, DistinguishChecksNeedOneUniqueNameCheckAndLocksWin) {
+TEST_F(AdminPage, DependantsFollowTheirChecksAndLocksWin) {
   _script.allInfoSet = true;
-  _script.values = {{"SheetNamesUnicity", {1}}, {"FilterNamesUnicity", {1}}};
+  _script.values = {{"SheetNamesUnicity", {1}}, {"FilterNamesUnicity", {1}}, {"ViewNamesUnicity", {1}}};
   _script.locked = {"DistinguishCaseInUnicity"};
   Open();
+  // The view name scope radios follow the view name check; distinguishing needs one unique name
+  // check. (What each radio group shows and writes is a test of every page.)
+  EXPECT_TRUE(Enabled("radViewNameUnicityInSheet"));
+  ASSERT_TRUE(Click("checkViewNamesUnicity"));
+  EXPECT_FALSE(Enabled("radViewNameUnicityInSheet"));
+  EXPECT_FALSE(Enabled("radViewNameUnicityInLayout"));
   EXPECT_TRUE(Enabled("chkDistinguishCodeInUnicity"));
   EXPECT_FALSE(Enabled("chkDistinguishCaseInUnicity"));
   ASSERT_TRUE(Click("checkSheetNamesUnicity"));

@@ -26,7 +26,12 @@ TEST_F(GeoPage, ModuleHooksShowZerosAndDisableTheDependants) {
   ExpectGolden("geo_dialogs_module_hooks.dump", dialogs);
 }
 
-TEST_F(GeoPage, WithoutGridPageTheSectionsKeepTheirRows) {
+TEST_F(GeoPage, EmbeddedGridPageWritesThroughTheSameHostAndTheRowsStayWithoutIt) {
+  Open();
+  ASSERT_TRUE(Click("checkGrid"));
+  ASSERT_TRUE(Click("DittoDrag"));
+  EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysDisplayGrid", "SetSysDittoPreventManip"}));
+  _script.calls.clear();
   _script.options["CreateGridFrame"] = 0;
   Open();
   EXPECT_EQ(Find("GridPage"), nullptr);
@@ -45,13 +50,6 @@ TEST_F(GeoPage, AllInfoHooksAnsweringZeroAndEveryDialog) {
   std::string dump = ZEPDlgDriver::Dump(_pPage);
   for (const auto& d : kDialogs) dump += ZEPDlgDriver::Dump(OpenDialog(d[0], d[1]));
   ExpectGolden("geo_page_info_zero.dump", dump);
-}
-
-TEST_F(GeoPage, EmbeddedGridPageWritesThroughTheSameHost) {
-  Open();
-  ASSERT_TRUE(Click("checkGrid"));
-  ASSERT_TRUE(Click("DittoDrag"));
-  EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysDisplayGrid", "SetSysDittoPreventManip"}));
 }
 
 TEST_F(GeoPage, DependantsFollowTheirCheckButtonsButLocksWin) {

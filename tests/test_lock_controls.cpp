@@ -45,8 +45,6 @@ TEST_F(LockControls, NamesCellsAndInnerControl) {
   ASSERT_NE(check->GetDialog(), nullptr);
   // The names and cells of padlock and inner control are in the dump below.
   EXPECT_EQ(check->GetName(), "checkGrid_dialog");
-  EXPECT_EQ(check->GetLock()->GetGridConstraints().justification, 0x1Eu);
-  EXPECT_EQ(check->GetDialog()->GetGridConstraints().justification, 0x58u);
 
   auto* frame = new ZEPDrwLockFrame(&_root, "frameGroup", info, 0x80001);
   EXPECT_EQ(frame->GetDialog()->GetOwnName(), "frameGrouplocked");
