@@ -22,6 +22,10 @@ protected:
     _script.texts = {{"StandardName", "key-a"}};
     _script.values = {{"IsStandardPLM", {1}}, {"InsertDrawing", {1}}, {"ScaleRatio", {0.5, 100, 10000, 0.01, 0.0001}}};
   }
+  void OpenEveryPart() {
+    ScriptEveryPart();
+    Open();
+  }
   // A fresh page in a window of its own, built: the rows it used.
   int Build() {
     delete _pWindow;
@@ -109,8 +113,7 @@ TEST_F(MainPage, PLMListsThatDoNotPairUpAreDropped) {
 
 // ---- choosing a standard -----------------------------------------------------------------------
 TEST_F(MainPage, ChoosingAFolderOrAPLMStandardWritesTheNameThenTheFlag) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   ASSERT_TRUE(ZEPDlgDriver::Select(StdCombo(), 1)); // ISO
   EXPECT_EQ(Hooks(), (Strings{"SetSysStandardName", "SetSysIsStandardPLM"}));
   EXPECT_EQ(Written("SetSysStandardName"), "ISO");
@@ -171,8 +174,7 @@ TEST_F(MainPage, TheListOffersOnlyChoicesWhileOpenAndTheStoredNameAgainWhenClose
 
 // ---- adding and removing PLM standards --------------------------------------------------------
 TEST_F(MainPage, ValidatedChoiceAddsTheNewStandardsAndMakesTheFirstCurrent) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   const int live = ZEPRefCounted::LiveCount();
   ASSERT_TRUE(Click("pusStandardPLMAdd"));
   ZEPIPLMChooser* chooser = ZEPPLMSetup::LiveChooser();
@@ -196,8 +198,7 @@ TEST_F(MainPage, ValidatedChoiceAddsTheNewStandardsAndMakesTheFirstCurrent) {
 }
 
 TEST_F(MainPage, ObjectsWithoutInterfacesOrAReliableKeyAreSkippedAndReported) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   const int live = ZEPRefCounted::LiveCount();
   ZEPPLMSetup::Standard noComponent{"No component", "key-1"}, noAlias{"No alias", "key-2"},
       keyFails{"Key fails", "key-3"}, notUnique{"Not unique", "key-4", -1}, good{"Good", "key-5"};
@@ -218,8 +219,7 @@ TEST_F(MainPage, ObjectsWithoutInterfacesOrAReliableKeyAreSkippedAndReported) {
 }
 
 TEST_F(MainPage, CancelledOrPressedTwiceTheChooserStaysTheOneThePageHolds) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   const int live = ZEPRefCounted::LiveCount();
   ASSERT_TRUE(Click("pusStandardPLMAdd"));
   ASSERT_TRUE(ZEPPLMSetup::Cancel());
@@ -242,8 +242,7 @@ TEST_F(MainPage, CancelledOrPressedTwiceTheChooserStaysTheOneThePageHolds) {
 }
 
 TEST_F(MainPage, ChooserServicesThatFailAreReportedAndLeaveNothingBehind) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   const int live = ZEPRefCounted::LiveCount();
   const struct {
     void (*setup)();
@@ -308,8 +307,7 @@ TEST_F(MainPage, RemovingTheCurrentPLMStandard) {
 
 // ---- scale ratio -------------------------------------------------------------------------------
 TEST_F(MainPage, RatioEntriesAreStoredForTheShownRangeWithinItsTolerances) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   ZEPDlgEditor* ratio = Editor("edtScaleRatio");
   const struct {
     const char* typed;
@@ -344,8 +342,7 @@ TEST_F(MainPage, RatioEntriesAreStoredForTheShownRangeWithinItsTolerances) {
 }
 
 TEST_F(MainPage, ANonPositiveToleranceRefusesEveryEntry) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   for (double tolerance : {0.0, -0.001}) {
     ZEPScaleToolboxSetup::Reset();
     ZEPScaleToolboxSetup::SetTolerance(ZEPCkeScaleNormal, 6, tolerance);
@@ -360,8 +357,7 @@ TEST_F(MainPage, ANonPositiveToleranceRefusesEveryEntry) {
 
 TEST_F(MainPage, WithoutScalesServiceTheFirstRangeStaysShown) {
   ZEPScalesSetup::SetAvailable(false);
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   ZEPCheckLog::Clear();
   EXPECT_EQ(Editor("edtScaleRatio")->GetText().str(), "1:2");
   ASSERT_TRUE(ZEPDlgDriver::EnterText(Editor("edtScaleRatio"), "1:5"));
@@ -371,8 +367,7 @@ TEST_F(MainPage, WithoutScalesServiceTheFirstRangeStaysShown) {
 
 // ---- flags and locks ---------------------------------------------------------------------------
 TEST_F(MainPage, ShareableFollowsInsertDrawingButItsLockWins) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   ASSERT_TRUE(Click("chkInsertDrawing"));
   EXPECT_FALSE(Enabled("chkMakeDrawingShareable"));
   ASSERT_TRUE(Click("chkInsertDrawing"));
