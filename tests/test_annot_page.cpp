@@ -186,6 +186,7 @@ TEST_F(AnnotPage, HostFailuresAndPressesWithoutSenderAreReportedAndLeaveTheButto
     EXPECT_EQ(ZEPCheckLog::Count(), 0);
   }
   // A press notified without a sender is reported too, and opens nothing.
+  ZEPDlgDriver::Idle();
   ZEPDialog* push = Control(kButtons[0]);
   push->DeliverAs(ZEPSysDynamicCast<ZEPDlgPushButton>(push)->GetPushBActivateNotification(), nullptr);
   EXPECT_TRUE(ZEPCheckLog::Contains("iFrom"));

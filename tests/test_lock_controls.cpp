@@ -16,6 +16,8 @@
 #include "ZEPDrwLockSlider.h"
 #include "ZEPDrwLockSpinner.h"
 
+#include <filesystem>
+
 namespace {
 ZEPSettingInfo Locked() {
   ZEPSettingInfo info;
@@ -256,9 +258,8 @@ TEST_F(LockControls, CatalogTextsReachNewControls) {
       return iIndex >= 1 ? ZEPDlgFrame::GetResourceFilename(iIndex - 1) : "ZEPTestCatalogPage";
     }
   };
-  std::string dir = ::testing::TempDir() + "zep_catalogs";
-  std::string mkdir = "mkdir -p " + dir + "/catalogs";
-  ASSERT_EQ(std::system(mkdir.c_str()), 0);
+  const std::string dir = ::testing::TempDir() + "zep_catalogs";
+  std::filesystem::create_directories(dir + "/catalogs");
   std::ofstream(dir + "/catalogs/ZEPTestCatalogPage.msg")
       << "# test catalog\n"
          "checkGrid.Title = \"Display the grid\";\n"
