@@ -151,6 +151,7 @@ public:
 // Base of the generated recording pages: forwards the page's protected constructor.
 template <class Page> class Recording : public Page {
 public:
+  using RecordedPage = Page;
   template <class... A>
   explicit Recording(HookScript& iScript, A&&... iArgs) : Page(std::forward<A>(iArgs)...), _script(iScript) {}
 
@@ -158,17 +159,17 @@ protected:
   HookScript& _script;
 };
 
-#define ZEP_RECORD_SETTING_HOOKS(Page, Name, Kind)                                                  \
+#define ZEP_RECORD_SETTING_HOOKS(Name, Kind)                                                        \
   long SetSys##Name(ZEP_SETPARAMS(Kind)) override {                                                 \
     this->_script.Record("SetSys" #Name, ZEP_SETARGS(Kind));                                        \
     return S_OK;                                                                                    \
   }                                                                                                 \
   long GetSys##Name(ZEP_GETPARAMS(Kind)) override {                                                 \
-    if (!this->_script.Fill(#Name, ZEP_GETARGS(Kind))) return Page::GetSys##Name(ZEP_GETARGS(Kind)); \
+    if (!this->_script.Fill(#Name, ZEP_GETARGS(Kind))) return this->RecordedPage::GetSys##Name(ZEP_GETARGS(Kind)); \
     return S_OK;                                                                                    \
   }                                                                                                 \
   long GetSys##Name##Info(ZEPSettingInfo& oInfo) override {                                         \
     long status = 0;                                                                                \
-    if (!this->_script.Info(#Name, oInfo, status)) return Page::GetSys##Name##Info(oInfo);          \
+    if (!this->_script.Info(#Name, oInfo, status)) return this->RecordedPage::GetSys##Name##Info(oInfo);          \
     return status;                                                                                  \
   }

@@ -3,48 +3,39 @@
 
 #include "PageRecorder.h"
 
-#include "ZEP2DBaseOptDimFrm.h"
 #include "ZEP2DBaseOptAdminFrm.h"
 #include "ZEP2DBaseOptAnnotFrm.h"
+#include "ZEP2DBaseOptDimFrm.h"
 #include "ZEP2DBaseOptDisplayFrm.h"
 #include "ZEP2DBaseOptGalFrm.h"
 #include "ZEP2DBaseOptGeoFrm.h"
 #include "ZEP2DBaseOptGridFrm.h"
-#include "ZEP2DBaseOptManipFrm.h"
 #include "ZEP2DBaseOptMainFrm.h"
+#include "ZEP2DBaseOptManipFrm.h"
 #include "ZEP2DBasePrimaryViewFrm.h"
+
+// Each class below records the hooks of the attributes its page's table lists.
+#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(Name, Kind)
 
 class RecordingGridPage : public Recording<ZEP2DBaseOptGridFrm> {
 public:
-  RecordingGridPage(HookScript& iScript, ZEPDialog* iParent)
-      : Recording<ZEP2DBaseOptGridFrm>(iScript, iParent, "GridPage") {}
-
+  RecordingGridPage(HookScript& iScript, ZEPDialog* iParent) : Recording(iScript, iParent, "GridPage") {}
 protected:
-#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptGridFrm, Name, Kind)
 #include "ZEP2DBaseOptGridFrm.def"
-#undef ZEP_SETTING
 };
 
 class RecordingGalPage : public Recording<ZEP2DBaseOptGalFrm> {
 public:
-  RecordingGalPage(HookScript& iScript, ZEPDialog* iParent)
-      : Recording<ZEP2DBaseOptGalFrm>(iScript, iParent, "GeneralPage") {}
-
+  RecordingGalPage(HookScript& iScript, ZEPDialog* iParent) : Recording(iScript, iParent, "GeneralPage") {}
 protected:
-#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptGalFrm, Name, Kind)
 #include "ZEP2DBaseOptGalFrm.def"
-#undef ZEP_SETTING
 };
 
 class RecordingPrimaryViewPage : public Recording<ZEP2DBasePrimaryViewFrm> {
 public:
-  RecordingPrimaryViewPage(HookScript& iScript, ZEPDialog* iParent)
-      : Recording<ZEP2DBasePrimaryViewFrm>(iScript, iParent) {}
-
+  RecordingPrimaryViewPage(HookScript& iScript, ZEPDialog* iParent) : Recording(iScript, iParent) {}
 protected:
-#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBasePrimaryViewFrm, Name, Kind)
 #include "ZEP2DBasePrimaryViewFrm.def"
-#undef ZEP_SETTING
   ZEPString GetFrameIconName() override { return "I_PrimaryView"; }
 };
 
@@ -52,13 +43,9 @@ protected:
 // "CreateGridFrame" option is 0.
 class RecordingGeoPage : public Recording<ZEP2DBaseOptGeoFrm> {
 public:
-  RecordingGeoPage(HookScript& iScript, ZEPDialog* iParent)
-      : Recording<ZEP2DBaseOptGeoFrm>(iScript, iParent, "GeometryPage") {}
-
+  RecordingGeoPage(HookScript& iScript, ZEPDialog* iParent) : Recording(iScript, iParent, "GeometryPage") {}
 protected:
-#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptGeoFrm, Name, Kind)
 #include "ZEP2DBaseOptGeoFrm.def"
-#undef ZEP_SETTING
   ZEP2DBaseOptGridFrm* CreateGridFrame() override {
     return _script.Option("CreateGridFrame", 1) ? new RecordingGridPage(_script, this) : nullptr;
   }
@@ -68,14 +55,11 @@ protected:
 // flag from "BuildFlag" (1 unless scripted).
 class RecordingManipPage : public Recording<ZEP2DBaseOptManipFrm> {
 public:
-  RecordingManipPage(HookScript& iScript, ZEPDialog* iParent)
-      : Recording<ZEP2DBaseOptManipFrm>(iScript, iParent, "ManipulatorsPage") {}
+  RecordingManipPage(HookScript& iScript, ZEPDialog* iParent) : Recording(iScript, iParent, "ManipulatorsPage") {}
   void Build() { ZEP2DBaseOptManipFrm::Build(static_cast<unsigned char>(_script.Option("BuildFlag", 1))); }
 
 protected:
-#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptManipFrm, Name, Kind)
 #include "ZEP2DBaseOptManipFrm.def"
-#undef ZEP_SETTING
   unsigned char WithDimManipSection() override {
     return static_cast<unsigned char>(
         _script.Option("WithDimManipSection", ZEP2DBaseOptManipFrm::WithDimManipSection()));
@@ -89,14 +73,11 @@ protected:
 // unless scripted; an empty text: none).
 class RecordingAdminPage : public Recording<ZEP2DBaseOptAdminFrm> {
 public:
-  RecordingAdminPage(HookScript& iScript, ZEPDialog* iParent)
-      : Recording<ZEP2DBaseOptAdminFrm>(iScript, iParent, "AdministrationPage") {}
+  RecordingAdminPage(HookScript& iScript, ZEPDialog* iParent) : Recording(iScript, iParent, "AdministrationPage") {}
   void Build() { ZEP2DBaseOptAdminFrm::Build(static_cast<unsigned char>(_script.Option("BuildFlag", 0))); }
 
 protected:
-#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptAdminFrm, Name, Kind)
 #include "ZEP2DBaseOptAdminFrm.def"
-#undef ZEP_SETTING
   ZEPString GetFrameIconName() override { return "I_AdminDrawing"; }
   unsigned char WithFrmGVS() override {
     _script.reads.push_back("WithFrmGVS");
@@ -119,17 +100,11 @@ protected:
 // and "GetDefaultStandardName" answers.
 class RecordingMainPage : public Recording<ZEP2DBaseOptMainFrm> {
 public:
-  RecordingMainPage(HookScript& iScript, ZEPDialog* iParent)
-      : Recording<ZEP2DBaseOptMainFrm>(iScript, iParent, "MainPage") {}
-
+  RecordingMainPage(HookScript& iScript, ZEPDialog* iParent) : Recording(iScript, iParent, "MainPage") {}
 protected:
   ZEPString GetFrameIconName() override { return _script.Answer("GetFrameIconName"); }
-  ZEPUnicodeString GetDefaultStandardName() override {
-    return _script.Answer("GetDefaultStandardName");
-  }
-#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptMainFrm, Name, Kind)
+  ZEPUnicodeString GetDefaultStandardName() override { return _script.Answer("GetDefaultStandardName"); }
 #include "ZEP2DBaseOptMainFrm.def"
-#undef ZEP_SETTING
 };
 
 // A page built and initialised on iParent, as the host does it.
@@ -143,13 +118,9 @@ template <class Page> Page* OpenPage(HookScript& iScript, ZEPDialog* iParent) {
 // The dimension page; its layout options answer from the script, else as the module does.
 class RecordingDimPage : public Recording<ZEP2DBaseOptDimFrm> {
 public:
-  RecordingDimPage(HookScript& iScript, ZEPDialog* iParent)
-      : Recording<ZEP2DBaseOptDimFrm>(iScript, iParent, "DimensionPage") {}
-
+  RecordingDimPage(HookScript& iScript, ZEPDialog* iParent) : Recording(iScript, iParent, "DimensionPage") {}
 protected:
-#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptDimFrm, Name, Kind)
 #include "ZEP2DBaseOptDimFrm.def"
-#undef ZEP_SETTING
   unsigned char WithFrmCreateDriveAndChamfer() override {
     return _script.Option("WithFrmCreateDriveAndChamfer", ZEP2DBaseOptDimFrm::WithFrmCreateDriveAndChamfer()) != 0;
   }
@@ -163,13 +134,9 @@ protected:
 // The annotation page: the legend table layout context is the script's "LegendContext" text.
 class RecordingAnnotPage : public Recording<ZEP2DBaseOptAnnotFrm> {
 public:
-  RecordingAnnotPage(HookScript& iScript, ZEPDialog* iParent)
-      : Recording<ZEP2DBaseOptAnnotFrm>(iScript, iParent, "AnnotationPage") {}
-
+  RecordingAnnotPage(HookScript& iScript, ZEPDialog* iParent) : Recording(iScript, iParent, "AnnotationPage") {}
 protected:
-#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptAnnotFrm, Name, Kind)
 #include "ZEP2DBaseOptAnnotFrm.def"
-#undef ZEP_SETTING
   ZEPString GetLegendTableLayoutContext() override {
     auto it = _script.texts.find("LegendContext");
     return it == _script.texts.end() ? ZEPString("DrwLegend") : ZEPString(it->second);
@@ -181,19 +148,15 @@ protected:
 // allows the track history check. The row after the last frame is kept in nextRow.
 class RecordingDisplayPage : public Recording<ZEP2DBaseOptDisplayFrm> {
 public:
-  RecordingDisplayPage(HookScript& iScript, ZEPDialog* iParent)
-      : Recording<ZEP2DBaseOptDisplayFrm>(iScript, iParent, "DisplayPage") {}
+  RecordingDisplayPage(HookScript& iScript, ZEPDialog* iParent) : Recording(iScript, iParent, "DisplayPage") {}
   void Build() {
     nextRow = static_cast<int>(_script.Option("FirstRow", 0));
-    ZEP2DBaseOptDisplayFrm::Build(nextRow,
-                                  static_cast<unsigned char>(_script.Option("WithTrackHistory", 1)));
+    ZEP2DBaseOptDisplayFrm::Build(nextRow, static_cast<unsigned char>(_script.Option("WithTrackHistory", 1)));
   }
   int nextRow = 0;
 
 protected:
-#define ZEP_SETTING(Name, Kind) ZEP_RECORD_SETTING_HOOKS(ZEP2DBaseOptDisplayFrm, Name, Kind)
 #include "ZEP2DBaseOptDisplayFrm.def"
-#undef ZEP_SETTING
   unsigned char WithFrmVisualization() override { return Predicate("WithFrmVisualization"); }
   unsigned char WithFrmGeometries() override { return Predicate("WithFrmGeometries"); }
   unsigned char WithFrmCallouts() override { return Predicate("WithFrmCallouts"); }
@@ -204,6 +167,43 @@ protected:
 private:
   unsigned char Predicate(const char* iName) { return _script.Option(iName, 1) ? 1 : 0; }
 };
+#undef ZEP_SETTING
+
+// The attributes of each page's table, in table order.
+#define ZEP_SETTING(Name, Kind) #Name,
+inline const std::vector<std::string> kGridAttributes = {
+#include "ZEP2DBaseOptGridFrm.def"
+};
+inline const std::vector<std::string> kGalAttributes = {
+#include "ZEP2DBaseOptGalFrm.def"
+};
+inline const std::vector<std::string> kPrimaryViewAttributes = {
+#include "ZEP2DBasePrimaryViewFrm.def"
+};
+inline const std::vector<std::string> kDimAttributes = {
+#include "ZEP2DBaseOptDimFrm.def"
+};
+inline const std::vector<std::string> kGeoAttributes = {
+    // with those of the embedded grid page
+#include "ZEP2DBaseOptGeoFrm.def"
+#include "ZEP2DBaseOptGridFrm.def"
+};
+inline const std::vector<std::string> kManipAttributes = {
+#include "ZEP2DBaseOptManipFrm.def"
+};
+inline const std::vector<std::string> kAdminAttributes = {
+#include "ZEP2DBaseOptAdminFrm.def"
+};
+inline const std::vector<std::string> kMainAttributes = {
+#include "ZEP2DBaseOptMainFrm.def"
+};
+inline const std::vector<std::string> kAnnotAttributes = {
+#include "ZEP2DBaseOptAnnotFrm.def"
+};
+inline const std::vector<std::string> kDisplayAttributes = {
+#include "ZEP2DBaseOptDisplayFrm.def"
+};
+#undef ZEP_SETTING
 
 // A page under test: the host's script, the page opened in a window of its own, and the ways
 // the user reaches its controls. A control is looked for on the page, or in iIn when given (a
@@ -254,21 +254,14 @@ protected:
     return on;
   }
   std::vector<std::string> Lines(const std::string& iCombo, ZEPDialog* iIn = nullptr) {
-    std::vector<std::string> out;
     ZEPDlgCombo* combo = Combo(iCombo, iIn);
-    for (int i = 0; combo && i < combo->GetLineCount(); ++i) {
-      ZEPUnicodeString text;
-      combo->GetLine(text, i);
-      out.push_back(text.str());
-    }
-    return out;
+    return combo ? ComboLines(*combo) : std::vector<std::string>{};
   }
   std::vector<std::string> Hooks() { return _script.Hooks(); }
   // The first number of every call of iHook, in order.
   std::vector<double> Written(const std::string& iHook) {
     std::vector<double> values;
-    for (const HookCall& call : _script.Calls(iHook))
-      values.push_back(call.values.at(0));
+    for (const HookCall& call : _script.Calls(iHook)) values.push_back(call.values.at(0));
     return values;
   }
   // Presses the push button and answers the dialog of that name it opened.

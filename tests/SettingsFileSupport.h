@@ -55,8 +55,7 @@ struct CliResult {
 // drafting-options iArgs..., run in this process.
 inline CliResult RunInProcess(const std::vector<std::string>& iArgs) {
   std::vector<const char*> argv = {"drafting-options"};
-  for (const std::string& a : iArgs)
-    argv.push_back(a.c_str());
+  for (const std::string& a : iArgs) argv.push_back(a.c_str());
   std::ostringstream out, err;
   CliResult r;
   r.code = zepapp::RunCli(static_cast<int>(argv.size()), argv.data(), out, err);
@@ -67,8 +66,7 @@ inline CliResult RunInProcess(const std::vector<std::string>& iArgs) {
 
 inline std::string ShellQuote(const std::string& s) {
   std::string q = "'";
-  for (char c : s)
-    q += c == '\'' ? std::string("'\\''") : std::string(1, c);
+  for (char c : s) q += c == '\'' ? std::string("'\\''") : std::string(1, c);
   return q + "'";
 }
 

@@ -9,6 +9,7 @@
 #include <fstream>
 #include <sstream>
 #include <string>
+#include <vector>
 
 // Compares iActual with tests/golden/<iName>. On mismatch writes <iName>.new beside it and
 // fails with its path. ZEP_UPDATE_GOLDEN=1 rewrites the snapshot instead.
@@ -32,6 +33,38 @@ inline ::testing::AssertionResult Has(const std::string& iText, const std::strin
   if (iText.find(iPart) != std::string::npos) return ::testing::AssertionSuccess();
   return ::testing::AssertionFailure() << "\"" << iPart << "\" is not in:\n" << iText;
 }
+
+// The text of a combo's line ("" when there is none), and all its lines.
+inline std::string ComboLine(const ZEPDlgCombo& iCombo, int iLine) {
+  ZEPUnicodeString text;
+  return iCombo.GetLine(text, iLine) < 0 ? "" : text.str();
+}
+inline std::vector<std::string> ComboLines(const ZEPDlgCombo& iCombo) {
+  std::vector<std::string> lines;
+  for (int i = 0; i < iCombo.GetLineCount(); ++i) lines.push_back(ComboLine(iCombo, i));
+  return lines;
+}
+
+// A frame that records the notifications it hears: "<sender>:<kind>", and a radio's state then.
+class NotificationRecorder : public ZEPDlgFrame {
+public:
+  explicit NotificationRecorder(ZEPDialog* iParent) : ZEPDlgFrame(iParent, "recorder") {}
+  void Listen(ZEPCommand* iSender, ZEPNotification* iNotif) {
+    AddAnalyseNotificationCB(iSender, iNotif, &NotificationRecorder::OnNotify, this);
+  }
+  std::vector<std::string> _events;
+  ZEPCommand* _pLastSender = nullptr;
+
+private:
+  void OnNotify(ZEPCommand* iSender, ZEPNotification* iNotif, void* iData) {
+    EXPECT_EQ(iData, this);
+    auto* w = ZEPSysDynamicCast<ZEPDialog>(iSender);
+    auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(iSender);
+    _events.push_back((w ? w->GetOwnName() : std::string("?")) + ":" + iNotif->GetKind() +
+                      (radio ? (radio->GetState() == ZEPDlgChecked ? "=on" : "=off") : ""));
+    _pLastSender = iSender;
+  }
+};
 
 // Every test starts from a host without repositories, checks or pending destructions.
 class ZEPHostTest : public ::testing::Test {

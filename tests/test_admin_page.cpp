@@ -6,12 +6,6 @@
 #include <algorithm>
 
 namespace {
-#define ZEP_SETTING(Name, Kind) #Name,
-const std::vector<std::string> kBehaviors = {
-#include "ZEP2DBaseOptAdminFrm.def"
-};
-#undef ZEP_SETTING
-
 class AdminPage : public PageTest<RecordingAdminPage> {
 protected:
   ZEPDlgDialog* PushBehavior() { return OpenDialog("pushPropTbBehavior", "dlgPropTbBehavior"); }
@@ -20,9 +14,7 @@ protected:
   }
 };
 
-std::string Text(const char* iKey) {
-  return ZEPMsgCatalog::BuildMessage("ZEP2DBaseOptAdminFrm", iKey).str();
-}
+std::string Text(const char* iKey) { return ZEPMsgCatalog::BuildMessage("ZEP2DBaseOptAdminFrm", iKey).str(); }
 } // namespace
 
 TEST_F(AdminPage, ModuleHooksBuildOnlyWhatNeedsNoInfo) {
@@ -43,8 +35,7 @@ TEST_F(AdminPage, BuildFlagAndHostOperationsDecideTheFrames) {
                        {"WithFrmTitleBlock", c.titleBlock}};
     Open();
     const std::string when = "flag " + std::to_string(c.flag);
-    for (const char* styles :
-         {"chkDisableTemplateCreation", "chkDisableGenMfgRequirements", "toolDrwStyle"})
+    for (const char* styles : {"chkDisableTemplateCreation", "chkDisableGenMfgRequirements", "toolDrwStyle"})
       EXPECT_EQ(Find(styles) != nullptr, c.flag == 0) << styles << when;
     EXPECT_EQ(Find("toolGVS") != nullptr, c.gvs != 0) << when;
     EXPECT_EQ(Find("toolAssemblyMgmt") != nullptr, c.assembly != 0) << when;
@@ -63,33 +54,29 @@ TEST_F(AdminPage, InfoGatesNotNegativeOrExactlyZero) {
     long status;
     bool built;
   } cases[] = {
+      // (Each control built when every info hook answers 0 is in the dump.)
       {"PrevSwitchStd", "checkSwitchStandard", 1, true},
       {"PrevSwitchStd", "checkSwitchStandard", -1, false},
-      {"PrevUpdateStd", "checkUpdateStandard", 0, true},
       {"PrevBackgroundAccess", "checkBackgroundView", E_NOTIMPL, false},
       {"PreventRootUpgrade", "chkPreventRootUpgrade", 2, true},
       {"PreventViewUpgrade", "chkPrevViewGeomUpgrade", 1, true},
       {"PreventViewUpgrade", "chkPrevViewGeomUpgrade", -1, false},
       {"DisableTemplateCreation", "chkDisableTemplateCreation", 1, true},
       {"DisableGenMfgRequirements", "chkDisableGenMfgRequirements", -5, false},
-      {"SheetNamesUnicity", "checkSheetNamesUnicity", 0, true},
       {"SheetNamesUnicity", "checkSheetNamesUnicity", 1, false},
-      {"ViewNameUnicityScope", "radViewNameUnicityInLayout", 0, true},
       {"ViewNameUnicityScope", "radViewNameUnicityInLayout", 1, false},
       {"CaptureNamesUnicity", "chkCaptureNamesUnicity", 1, false},
-      {"DistinguishCodeInUnicity", "chkDistinguishCodeInUnicity", 0, true},
-      {"EnggConLocation", "radSelectedAssGeomWithAnnotation", 0, true},
       {"EnggConLocation", "LblEngineeringConnectionLocation", 1, false},
       // Controls whose status is not looked at.
       {"PrevViewGeomUpgrade", "chkPrevViewGeomUpgrade", -1, true},
       {"SelectionOnCurrentAssembly", "radElemUnderCurAssemblyRoot", -1, true},
-      {"ShowWarningSelectionOutAssembly", "chkShowWarningSelectionOutAssembly", -1, true},};
+      {"ShowWarningSelectionOutAssembly", "chkShowWarningSelectionOutAssembly", -1, true},
+  };
   for (const auto& c : cases) {
     _script.allInfoSet = true;
     _script.info = {{c.attribute, c.status}};
     Open();
-    EXPECT_EQ(Find(c.widget) != nullptr, c.built)
-        << c.widget << " with " << c.attribute << " info " << c.status;
+    EXPECT_EQ(Find(c.widget) != nullptr, c.built) << c.widget << " with " << c.attribute << " info " << c.status;
   }
 }
 
@@ -110,18 +97,6 @@ TEST_F(AdminPage, EnvironmentSectionShowsTrueDimensionsWithTheirOwnPadlock) {
     EXPECT_EQ(Click("chkPrevTrueDim"), !trueDimLocked);
     EXPECT_EQ(Hooks().size(), trueDimLocked ? 0u : 1u);
   }
-}
-
-// The view name scope radios follow the view name check. (What each radio group shows and
-// writes is a test of every page.)
-TEST_F(AdminPage, ScopeRadiosFollowTheViewNameCheck) {
-  _script.allInfoSet = true;
-  _script.values = {{"ViewNamesUnicity", {1}}};
-  Open();
-  EXPECT_TRUE(Enabled("radViewNameUnicityInSheet"));
-  ASSERT_TRUE(Click("checkViewNamesUnicity"));
-  EXPECT_FALSE(Enabled("radViewNameUnicityInSheet"));
-  EXPECT_FALSE(Enabled("radViewNameUnicityInLayout"));
 }
 
 TEST_F(AdminPage, ScopeRuleOfTheAssemblyWarningsUnderPadlocks) {
@@ -159,11 +134,17 @@ TEST_F(AdminPage, ScopeRuleOfTheAssemblyWarningsUnderPadlocks) {
   EXPECT_FALSE(Enabled("chkShowWarningSelectionOutAssembly"));
 }
 
-TEST_F(AdminPage, DistinguishChecksNeedOneUniqueNameCheckAndLocksWin) {
+TEST_F(AdminPage, DependantsFollowTheirChecksAndLocksWin) {
   _script.allInfoSet = true;
-  _script.values = {{"SheetNamesUnicity", {1}}, {"FilterNamesUnicity", {1}}};
+  _script.values = {{"SheetNamesUnicity", {1}}, {"FilterNamesUnicity", {1}}, {"ViewNamesUnicity", {1}}};
   _script.locked = {"DistinguishCaseInUnicity"};
   Open();
+  // The view name scope radios follow the view name check; distinguishing needs one unique name
+  // check. (What each radio group shows and writes is a test of every page.)
+  EXPECT_TRUE(Enabled("radViewNameUnicityInSheet"));
+  ASSERT_TRUE(Click("checkViewNamesUnicity"));
+  EXPECT_FALSE(Enabled("radViewNameUnicityInSheet"));
+  EXPECT_FALSE(Enabled("radViewNameUnicityInLayout"));
   EXPECT_TRUE(Enabled("chkDistinguishCodeInUnicity"));
   EXPECT_FALSE(Enabled("chkDistinguishCaseInUnicity"));
   ASSERT_TRUE(Click("checkSheetNamesUnicity"));
@@ -232,7 +213,7 @@ TEST_F(AdminPage, BehaviorDialogShowsOnlyRowsWhoseInfoAnswersZero) {
   Open();
   dialog = PushBehavior();
   int rows = 0;
-  for (const std::string& name : kBehaviors) {
+  for (const std::string& name : kAdminAttributes) {
     if (name.rfind("DrwTb", 0) != 0) continue;
     ZEPDialog* combo = Find("cmb" + name, dialog);
     const bool shown = name != "DrwTbBold" && name != "DrwTbPattern";
@@ -246,8 +227,7 @@ TEST_F(AdminPage, BehaviorDialogShowsOnlyRowsWhoseInfoAnswersZero) {
 }
 
 TEST_F(AdminPage, BehaviorLinesAndConversionsWithAndWithoutGVS) {
-  const std::string fix = Text("fix"), elem = Text("elemtype"), style = Text("style"),
-                    none = Text("nooverload");
+  const std::string fix = Text("fix"), elem = Text("elemtype"), style = Text("style"), none = Text("nooverload");
   const std::vector<std::string> all = {fix, elem, style, none}, shifted = {elem, style, none},
                                  noElem = {fix, style, none};
   const struct {
@@ -255,18 +235,15 @@ TEST_F(AdminPage, BehaviorLinesAndConversionsWithAndWithoutGVS) {
     int gvs;
     std::vector<std::string> lines;
     double stored;
-    int shown;     // selected line
-    int chosen;    // line picked by the user
+    int shown;  // selected line
+    int chosen; // line picked by the user
     double written;
   } cases[] = {
-      {"DrwTbFontName", 1, all, 2, 2, 3, 3},
-      {"DrwTbFrame", 1, shifted, 0, -1, 0, 1},
-      {"DrwTbNumDispDesc", 0, shifted, 3, 2, 1, 2},
-      {"DrwTbColor", 0, noElem, 1, 0, 1, 2},
-      {"DrwTbColor", 1, all, 1, 1, 0, 0},
-      {"DrwTbPointType", 0, noElem, 0, 0, 2, 3},
-      {"DrwTbPattern", 1, noElem, 3, 2, 0, 0},
-      {"DrwTbPattern", 0, noElem, 2, 1, 1, 2},};
+      {"DrwTbFontName", 1, all, 2, 2, 3, 3},        {"DrwTbFrame", 1, shifted, 0, -1, 0, 1},
+      {"DrwTbNumDispDesc", 0, shifted, 3, 2, 1, 2}, {"DrwTbColor", 0, noElem, 1, 0, 1, 2},
+      {"DrwTbColor", 1, all, 1, 1, 0, 0},           {"DrwTbPointType", 0, noElem, 0, 0, 2, 3},
+      {"DrwTbPattern", 1, noElem, 3, 2, 0, 0},      {"DrwTbPattern", 0, noElem, 2, 1, 1, 2},
+  };
   for (const auto& c : cases) {
     _script.allInfoSet = true;
     _script.options = {{"WithFrmGVS", c.gvs}};
@@ -327,8 +304,7 @@ TEST_F(AdminPage, BehaviorDialogPlacementIsRestoredAndSaved) {
     ASSERT_TRUE(ZEPDlgDriver::CloseDialog(dialog));
     ZEPDlgDriver::Idle();
     int saved[4] = {};
-    for (int i = 0; i < 4; ++i)
-      prefs->ReadPreference(keys[i], &saved[i]);
+    for (int i = 0; i < 4; ++i) prefs->ReadPreference(keys[i], &saved[i]);
     EXPECT_EQ(std::vector<int>(saved, saved + 4), (std::vector<int>{5, 6, 700, 800}));
     EXPECT_FALSE(prefs->IsModified()) << "saved";
   }
@@ -367,8 +343,8 @@ TEST_F(AdminPage, SecondPushShowsTheOpenDialogAndClosingForgetsItsCombos) {
 TEST_F(AdminPage, AllInfoHooksAnsweringZeroWithTheDialog) {
   _script.allInfoSet = true;
   _script.locked = {"ViewNameUnicityScope", "DrwTbSymbol"};
-  _script.values = {{"ViewNamesUnicity", {1}}, {"SelectionOnCurrentAssembly", {2}},
-                    {"PrevGenViewStyle", {1}}, {"DrwTbColor", {2}}};
+  _script.values = {
+      {"ViewNamesUnicity", {1}}, {"SelectionOnCurrentAssembly", {2}}, {"PrevGenViewStyle", {1}}, {"DrwTbColor", {2}}};
   _script.texts = {{"FolderTitleBlock", "/srv/frames"}};
   setenv("ZEP_TDE_LA", "1", 1);
   Open();

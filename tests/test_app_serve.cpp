@@ -78,10 +78,8 @@ protected:
   }
   // The command line's binary on the same files.
   int RunBinary(const std::string& iArgs) const {
-    const std::string cmd = std::string(ZEP_APP_BINARY) + " --settings '" + _user.string() + "' --admin '" +
-                            _admin.string() + "' " + iArgs + " >/dev/null 2>&1";
-    const int status = std::system(cmd.c_str());
-    return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    const std::string files = " --settings " + ShellQuote(_user.string()) + " --admin " + ShellQuote(_admin.string());
+    return RunShell(ShellQuote(ZEP_APP_BINARY) + files + " " + iArgs, _dir).code;
   }
 
   std::unique_ptr<ZEPAppServer> _pServer;
@@ -283,13 +281,14 @@ TEST_F(SettingsFolderTest, ServeCommandPrintsItsAddressAndStopsOnSigterm) {
       }
     }
   } reaper{pid};
+  // What the server printed, read until iUntil shows or the output ends.
   std::string printed;
-  char buffer[256];
-  while (printed.find("Ctrl+C") == std::string::npos) {
-    const ssize_t n = read(out[0], buffer, sizeof buffer);
-    if (n <= 0) break;
-    printed.append(buffer, static_cast<std::size_t>(n));
-  }
+  auto readUntil = [&](const char* iUntil) {
+    char buffer[256];
+    for (ssize_t n = 1; n > 0 && printed.find(iUntil) == std::string::npos;)
+      if ((n = read(out[0], buffer, sizeof buffer)) > 0) printed.append(buffer, static_cast<std::size_t>(n));
+  };
+  readUntil("Ctrl+C");
   const std::size_t at = printed.find("http://127.0.0.1:");
   ASSERT_NE(at, std::string::npos) << printed;
   const int port = std::atoi(printed.c_str() + at + 17);
@@ -300,22 +299,17 @@ TEST_F(SettingsFolderTest, ServeCommandPrintsItsAddressAndStopsOnSigterm) {
   ASSERT_TRUE(r);
   EXPECT_EQ(r->status, 200);
   // Its port is its own: a second server cannot take it over, nor share it.
-  const std::string second = "timeout 5 " + std::string(ZEP_APP_BINARY) + " serve --no-open --port " +
-                             std::to_string(port) + " --settings '" + _user.string() + "' --admin '" +
-                             _admin.string() + "' >/dev/null 2>&1";
-  const int secondStatus = std::system(second.c_str());
-  EXPECT_EQ(WIFEXITED(secondStatus) ? WEXITSTATUS(secondStatus) : -1, 1);
+  const std::string files = " --settings " + ShellQuote(_user.string()) + " --admin " + ShellQuote(_admin.string());
+  const std::string serve = "timeout 5 " + ShellQuote(ZEP_APP_BINARY) + " serve --no-open --port " +
+                            std::to_string(port);
+  EXPECT_EQ(RunShell(serve + files, _dir).code, 1);
   kill(pid, SIGTERM);
   int status = 0;
   ASSERT_EQ(waitpid(pid, &status, 0), pid);
   reaper.pid = 0;
   EXPECT_TRUE(WIFEXITED(status));
   EXPECT_EQ(WEXITSTATUS(status), 0);
-  while (true) {
-    const ssize_t n = read(out[0], buffer, sizeof buffer);
-    if (n <= 0) break;
-    printed.append(buffer, static_cast<std::size_t>(n));
-  }
+  readUntil("Stopped.");
   close(out[0]);
   EXPECT_TRUE(Has(printed, "Stopped."));
   EXPECT_EQ(nlohmann::json::parse(ReadBytes(_user))["settings"]["DrwSketcherSpecific"]["Drw_settings_GridSnapPt"]["int"], 0);

@@ -19,8 +19,8 @@ using Heard = std::vector<std::pair<std::string, Values>>; // event, what the ad
 Values ReadAll(Adapt& iAdapt) {
   Values v{{Adapt::mstrGridDisplay, {double(iAdapt.GetGridVisuMode())}},
            {Adapt::mstrGridSnapPt, {double(iAdapt.GetGridSnapMode())}}};
-  for (ZEPCkeScale r : {ZEPCkeScaleNormal, ZEPCkeScaleLarge, ZEPCkeScaleExtraLarge,
-                        ZEPCkeScaleSmall, ZEPCkeScaleExtraSmall}) {
+  for (ZEPCkeScale r :
+       {ZEPCkeScaleNormal, ZEPCkeScaleLarge, ZEPCkeScaleExtraLarge, ZEPCkeScaleSmall, ZEPCkeScaleExtraSmall}) {
     v[Adapt::mstrGridHPrSpacing].push_back(iAdapt.GetGridPrimSpac(r));
     v[Adapt::mstrGridHSecStep].push_back(iAdapt.GetGridSecStep(r));
     v[Adapt::mstrAllowDistortions].push_back(iAdapt.GetAllowDistortions(r));
@@ -29,11 +29,10 @@ Values ReadAll(Adapt& iAdapt) {
   }
   // The diagnosis of sketch geometry, which the display page shows.
   v[Adapt::mstrDiagElts] = {double(iAdapt.GetDiagElts())};
-  const std::pair<ZEP2DCstDiag, const char*> diags[] = {
-      {ZEP2DCstOverDefined, Adapt::mstrColorDiagOverDefinedElts},
-      {ZEP2DCstNotConsistent, Adapt::mstrColorDiagNotConsistentElts},
-      {ZEP2DCstNotChanged, Adapt::mstrColorDiagNotChangedElts},
-      {ZEP2DCstWellDefined, Adapt::mstrColorDiagWellDefinedElts}};
+  const std::pair<ZEP2DCstDiag, const char*> diags[] = {{ZEP2DCstOverDefined, Adapt::mstrColorDiagOverDefinedElts},
+                                                        {ZEP2DCstNotConsistent, Adapt::mstrColorDiagNotConsistentElts},
+                                                        {ZEP2DCstNotChanged, Adapt::mstrColorDiagNotChangedElts},
+                                                        {ZEP2DCstWellDefined, Adapt::mstrColorDiagWellDefinedElts}};
   for (const auto& d : diags) {
     unsigned int r = 0, g = 0, b = 0;
     iAdapt.GetColorDiagElts(d.first, &r, &g, &b);
@@ -55,18 +54,15 @@ protected:
     ZEPHostTest::TearDown();
   }
   void Listen(ZEPAppSketcherSettings& iSk, Heard& oHeard) {
-    for (const char* event :
-         {Adapt::GridModification(), Adapt::SnapModification(), Adapt::GeomUIModification(),
-          Adapt::CpltModification(), Adapt::MultiModification(), Adapt::Visu3DUIModification()})
+    for (const char* event : {Adapt::GridModification(), Adapt::SnapModification(), Adapt::GeomUIModification(),
+                              Adapt::CpltModification(), Adapt::MultiModification(), Adapt::Visu3DUIModification()})
       iSk.AddCallback(event, [&iSk, &oHeard](const char* iName, ZEPNotification*, void*) {
         oHeard.emplace_back(iName, ReadAll(iSk));
       });
   }
   void OpenGrid() { _pPage = FindPage("grid")->open(&_root); }
   ZEPDialog* Control(const char* iName) { return ZEPDlgDriver::FindControl(_pPage, iName); }
-  bool SelectRange(int iRange) {
-    return ZEPDlgDriver::Select(ZEPDlgDriver::Find(_pPage, "cmbGridRange"), iRange - 1);
-  }
+  bool SelectRange(int iRange) { return ZEPDlgDriver::Select(ZEPDlgDriver::Find(_pPage, "cmbGridRange"), iRange - 1); }
 
   std::unique_ptr<ZEPAppSketcherSettings> _pSketcher;
   Heard _heard;
@@ -100,8 +96,7 @@ TEST_F(AppSketcher, EachGridPageChangeSendsOneEventWithTheNewValueInItsRangeOnly
     entries[entries.size() == 5 ? c.range - 1 : 0] = c.expected;
     _heard.clear();
     ZEPDialog* control = Control(c.control);
-    ASSERT_TRUE(c.entered < 0 ? ZEPDlgDriver::Click(control)
-                              : ZEPDlgDriver::Enter(control, c.entered));
+    ASSERT_TRUE(c.entered < 0 ? ZEPDlgDriver::Click(control) : ZEPDlgDriver::Enter(control, c.entered));
     ASSERT_EQ(_heard.size(), 1u);
     EXPECT_EQ(_heard[0].first, c.event());
     EXPECT_EQ(_heard[0].second, expected); // already readable, other ranges as they were
@@ -109,8 +104,7 @@ TEST_F(AppSketcher, EachGridPageChangeSendsOneEventWithTheNewValueInItsRangeOnly
 }
 
 TEST_F(AppSketcher, LockedOrRefusedWritesNotifyNothing) {
-  ZEPSysSettingRepository* specific =
-      ZEPSysSettingRepository::GetRepository(kSketcherSpecificRepository);
+  ZEPSysSettingRepository* specific = ZEPSysSettingRepository::GetRepository(kSketcherSpecificRepository);
   specific->SetLock(Adapt::mstrGridHSecStep, true, "admin");
   OpenGrid();
   const Values before = ReadAll(*_pSketcher);
@@ -146,8 +140,7 @@ TEST_F(AppSketcher, TableDefaultsAreTheAdapterReadDefaultsForEveryRange) {
   ZEPSysSettingRepository::CloseAll();
   ZEPAppSketcherSettings sketcher; // empty repositories: the adapter's own defaults
   const Values own = ReadAll(sketcher);
-  for (ZEP2DCstDiag diag :
-       {ZEP2DCstOverDefined, ZEP2DCstNotConsistent, ZEP2DCstNotChanged, ZEP2DCstWellDefined}) {
+  for (ZEP2DCstDiag diag : {ZEP2DCstOverDefined, ZEP2DCstNotConsistent, ZEP2DCstNotChanged, ZEP2DCstWellDefined}) {
     unsigned int r = 0, g = 0, b = 0;
     sketcher.GetColorDiagElts(diag, &r, &g, &b);
     EXPECT_EQ((r << 16) | (g << 8) | b, sketcher.GetDefaultColorDiagElts(diag)) << diag;

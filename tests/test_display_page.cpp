@@ -5,25 +5,11 @@
 
 namespace {
 // The analysed states, in dialog order.
-const char* const kStates[] = {"AnnotDelGeom",
-                               "AnnotUnloadGeom",
-                               "AnnotInvalid",
-                               "DimNotUpToDate",
-                               "DimNonAssoc",
-                               "DimIsolated",
-                               "DimBroken",
-                               "DimFake",
-                               "DimDriving",
-                               "Dim3DCst",
-                               "TechFeatDim",
-                               "DimTrue",
-                               "DimOnNonVisGeom",
-                               "DimClipped",
-                               "FilterGeneratedElements",
-                               "CalloutLastUpdateFailed",
-                               "IsolatedCallout",
-                               "NotPerpendicularCallout",
-                               "DrwWeldNotUpToDate"};
+const char* const kStates[] = {
+    "AnnotDelGeom", "AnnotUnloadGeom", "AnnotInvalid", "DimNotUpToDate", "DimNonAssoc", "DimIsolated", "DimBroken",
+    "DimFake", "DimDriving", "Dim3DCst", "TechFeatDim", "DimTrue", "DimOnNonVisGeom", "DimClipped",
+    "FilterGeneratedElements", "CalloutLastUpdateFailed", "IsolatedCallout", "NotPerpendicularCallout",
+    "DrwWeldNotUpToDate"};
 const char* const kDiagColors[] = {"OverConsElts", "InconsElts", "NotChanElts", "IsoConsElts"};
 
 class DisplayPage : public PageTest<RecordingDisplayPage> {
@@ -45,16 +31,11 @@ TEST_F(DisplayPage, ModuleHooksBuildOnlyTheControlsThatNeedNoAnswer) {
 
 TEST_F(DisplayPage, InfoZeroHostWithBothDialogsOpen) {
   _script.allInfoSet = true;
-  _script.values = {{"DimAnalysisDisplay", {1}},
-                    {"VisuDiagnostic", {1}},
-                    {"DimDriving", {1}},
-                    {"DimDrivingColor", {255, 0, 0}},
-                    {"AnnotInSpecTreePlane", {1}},
-                    {"PatternContourPitch", {1}},
-                    {"PatternContourPitchThickness", {3}},
-                    {"OverConsElts", {255, 0, 255}},
-                    {"CappingColor", {0, 128, 0}},
-                    {"BackgroundInViewFrameMode", {2}}};
+  _script.values = {
+      {"DimAnalysisDisplay", {1}},           {"VisuDiagnostic", {1}},         {"DimDriving", {1}},
+      {"DimDrivingColor", {255, 0, 0}},      {"AnnotInSpecTreePlane", {1}},   {"PatternContourPitch", {1}},
+      {"PatternContourPitchThickness", {3}}, {"OverConsElts", {255, 0, 255}}, {"CappingColor", {0, 128, 0}},
+      {"BackgroundInViewFrameMode", {2}}};
   Open();
   std::string dump = ZEPDlgDriver::Dump(_pPage);
   dump += ZEPDlgDriver::Dump(AnalysisDialog());
@@ -152,9 +133,8 @@ TEST_F(DisplayPage, PageChecksAndTheirDependants) {
     EXPECT_EQ(Enabled(c.dependant), !on) << c.dependant;
   }
   EXPECT_TRUE(Checked("checkAnnotInSpecTreeAnnotSet")) << "disabled, its value kept";
-  EXPECT_EQ(Hooks(),
-            (std::vector<std::string>{"SetSysAnnotInSpecTreePlane", "SetSysDimAnalysisDisplay",
-                                      "SetSysVisuDiagnostic", "SetSysBackgroundInViewFrame"}));
+  EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysAnnotInSpecTreePlane", "SetSysDimAnalysisDisplay",
+                                               "SetSysVisuDiagnostic", "SetSysBackgroundInViewFrame"}));
 }
 
 TEST_F(DisplayPage, CappingColourFollowsTheBackgroundRadiosAndBothPadlocks) {
@@ -169,8 +149,8 @@ TEST_F(DisplayPage, CappingColourFollowsTheBackgroundRadiosAndBothPadlocks) {
   EXPECT_TRUE(Enabled("cmbCappingColor"));
   EXPECT_TRUE(Enabled("chkCappingColorScale"));
   ASSERT_TRUE(ZEPDlgDriver::SelectColor(Control("cmbCappingColor"), 10, 20, 30));
-  ASSERT_EQ(Hooks(), (std::vector<std::string>{"SetSysCappingBackground", "SetSysCappingBackground",
-                                               "SetSysCappingColor"}));
+  ASSERT_EQ(Hooks(),
+            (std::vector<std::string>{"SetSysCappingBackground", "SetSysCappingBackground", "SetSysCappingColor"}));
   EXPECT_EQ(_script.calls[2].values, (std::vector<double>{10, 20, 30}));
   // Locking the background locks the colour and its scale, which sit inside its frame.
   for (const char* lock : {"CappingBackground", "CappingColor"}) {
@@ -178,9 +158,7 @@ TEST_F(DisplayPage, CappingColourFollowsTheBackgroundRadiosAndBothPadlocks) {
     _script.values = {{"CappingBackground", {0}}};
     Open();
     EXPECT_FALSE(Enabled("cmbCappingColor")) << lock;
-    EXPECT_EQ(Enabled("chkCappingColorScale"),
-              std::string(lock) == "CappingColor")
-        << lock;
+    EXPECT_EQ(Enabled("chkCappingColorScale"), std::string(lock) == "CappingColor") << lock;
   }
 }
 
@@ -237,12 +215,10 @@ TEST_F(DisplayPage, PatternPitchWeightAndDiagnosisColours) {
   ASSERT_TRUE(ZEPDlgDriver::Select(weight, 4));
   ZEPDlgDialog* diag = DiagDialog();
   unsigned int rgb[3] = {0, 0, 0};
-  ZEPSysDynamicCast<ZEPComboColor>(Control("cmbOverConsElts", diag))
-      ->GetSelectedColor(&rgb[0], &rgb[1], &rgb[2]);
+  ZEPSysDynamicCast<ZEPComboColor>(Control("cmbOverConsElts", diag))->GetSelectedColor(&rgb[0], &rgb[1], &rgb[2]);
   EXPECT_EQ(std::vector<unsigned int>(rgb, rgb + 3), (std::vector<unsigned int>{200, 100, 50}));
   // A colour out of range is not shown: no conversion wraps it into one.
-  ZEPSysDynamicCast<ZEPComboColor>(Control("cmbInconsElts", diag))
-      ->GetSelectedColor(&rgb[0], &rgb[1], &rgb[2]);
+  ZEPSysDynamicCast<ZEPComboColor>(Control("cmbInconsElts", diag))->GetSelectedColor(&rgb[0], &rgb[1], &rgb[2]);
   EXPECT_NE(std::vector<unsigned int>(rgb, rgb + 3), (std::vector<unsigned int>{255, 0, 0}));
   for (const char* name : kDiagColors)
     ASSERT_TRUE(ZEPDlgDriver::SelectColor(Control(std::string("cmb") + name, diag), 255, 128, 0));
@@ -265,8 +241,7 @@ TEST_F(DisplayPage, DialogsOpenOnceAndLocksHoldInside) {
   EXPECT_EQ(AnalysisDialog(), analysis) << "a second press shows the open dialog";
   EXPECT_EQ(analysis->GetVisibility(), ZEPDlgShow);
   int dialogs = 0;
-  for (ZEPDialog* child : _pPage->GetChildren())
-    dialogs += ZEPSysDynamicCast<ZEPDlgDialog>(child) ? 1 : 0;
+  for (ZEPDialog* child : _pPage->GetChildren()) dialogs += ZEPSysDynamicCast<ZEPDlgDialog>(child) ? 1 : 0;
   EXPECT_EQ(dialogs, 1);
   // A locked state stays off-limits though ticked; its colour, not locked, follows the state.
   EXPECT_FALSE(Click("chkDimFake", analysis));

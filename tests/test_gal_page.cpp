@@ -5,9 +5,7 @@ namespace {
 class GalPage : public PageTest<RecordingGalPage> {
 protected:
   std::string SelectedUnit() {
-    ZEPUnicodeString text;
-    Combo("cmbPaperLengthUnit")->GetLine(text, Combo("cmbPaperLengthUnit")->GetSelect());
-    return text.str();
+    return ComboLine(*Combo("cmbPaperLengthUnit"), Combo("cmbPaperLengthUnit")->GetSelect());
   }
 };
 } // namespace

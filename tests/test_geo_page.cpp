@@ -26,7 +26,12 @@ TEST_F(GeoPage, ModuleHooksShowZerosAndDisableTheDependants) {
   ExpectGolden("geo_dialogs_module_hooks.dump", dialogs);
 }
 
-TEST_F(GeoPage, WithoutGridPageTheSectionsKeepTheirRows) {
+TEST_F(GeoPage, EmbeddedGridPageWritesThroughTheSameHostAndTheRowsStayWithoutIt) {
+  Open();
+  ASSERT_TRUE(Click("checkGrid"));
+  ASSERT_TRUE(Click("DittoDrag"));
+  EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysDisplayGrid", "SetSysDittoPreventManip"}));
+  _script.calls.clear();
   _script.options["CreateGridFrame"] = 0;
   Open();
   EXPECT_EQ(Find("GridPage"), nullptr);
@@ -43,16 +48,8 @@ TEST_F(GeoPage, AllInfoHooksAnsweringZeroAndEveryDialog) {
                     {"CstVisuPara", {1}},      {"SmartPickAlign", {1}}};
   Open();
   std::string dump = ZEPDlgDriver::Dump(_pPage);
-  for (const auto& d : kDialogs)
-    dump += ZEPDlgDriver::Dump(OpenDialog(d[0], d[1]));
+  for (const auto& d : kDialogs) dump += ZEPDlgDriver::Dump(OpenDialog(d[0], d[1]));
   ExpectGolden("geo_page_info_zero.dump", dump);
-}
-
-TEST_F(GeoPage, EmbeddedGridPageWritesThroughTheSameHost) {
-  Open();
-  ASSERT_TRUE(Click("checkGrid"));
-  ASSERT_TRUE(Click("DittoDrag"));
-  EXPECT_EQ(Hooks(), (std::vector<std::string>{"SetSysDisplayGrid", "SetSysDittoPreventManip"}));
 }
 
 TEST_F(GeoPage, DependantsFollowTheirCheckButtonsButLocksWin) {
@@ -80,8 +77,7 @@ TEST_F(GeoPage, ColoursAreReadThroughTheColourCombos) {
   ASSERT_TRUE(ZEPDlgDriver::SelectColor(Control("cmbSmartPick"), 10, 20, 30));
   ASSERT_TRUE(ZEPDlgDriver::SelectColor(Control("comboCstColor"), 200, 0, 7));
   ASSERT_TRUE(ZEPDlgDriver::Select(Control("comboCstColor"), 2)); // a named line: red
-  ASSERT_EQ(Hooks(),
-            (std::vector<std::string>{"SetSysSmartPick", "SetSysColorCst", "SetSysColorCst"}));
+  ASSERT_EQ(Hooks(), (std::vector<std::string>{"SetSysSmartPick", "SetSysColorCst", "SetSysColorCst"}));
   EXPECT_EQ(_script.calls[0].values, (std::vector<double>{10, 20, 30}));
   EXPECT_EQ(_script.calls[1].values, (std::vector<double>{200, 0, 7}));
   EXPECT_EQ(_script.calls[2].values, (std::vector<double>{255, 0, 0}));
@@ -110,21 +106,16 @@ TEST_F(GeoPage, DragModeRadioNotifiedWhileOnWritesWhatItShows) {
   Open();
   OpenDialog("dragOptionPushButton", "geoAllowGeomManip");
   ASSERT_TRUE(Checked("radioDragModeStd"));
-  Radio("radioDragModeStd")
-      ->SendNotification(Radio("radioDragModeStd")->GetRadBModifyNotification());
+  Radio("radioDragModeStd")->SendNotification(Radio("radioDragModeStd")->GetRadBModifyNotification());
   EXPECT_EQ(Written("SetSysDragSolveMode"), std::vector<double>{0});
 }
 
 TEST_F(GeoPage, EverySubDialogOpensOnceWritesAndForgetsItsControlsWhenClosed) {
-  _script.values = {{"AllowGeomManip", {1}},
-                    {"DisplayCst", {1}},
-                    {"SmartPickHoriVerti", {1}},
-                    {"CstVisuSym", {1}}};
+  _script.values = {{"AllowGeomManip", {1}}, {"DisplayCst", {1}}, {"SmartPickHoriVerti", {1}}, {"CstVisuSym", {1}}};
   Open();
   EXPECT_EQ(As<ZEPDlgCheckButton>("checkSmartPickHoriVerti"), nullptr); // not before the push
   const char* const inside[] = {"checkDragWithEndPts", "checkSmartPickHoriVerti", "checkCstVisuSym"};
-  const char* const hooks[] = {"SetSysDragWithEndPts", "SetSysSmartPickHoriVerti",
-                               "SetSysCstVisuSym"};
+  const char* const hooks[] = {"SetSysDragWithEndPts", "SetSysSmartPickHoriVerti", "SetSysCstVisuSym"};
   for (int i = 0; i < 3; ++i) {
     for (bool windowClose : {false, true}) {
       _script.calls.clear();
@@ -138,8 +129,7 @@ TEST_F(GeoPage, EverySubDialogOpensOnceWritesAndForgetsItsControlsWhenClosed) {
       EXPECT_EQ(dialog->GetVisibility(), ZEPDlgShow);
       auto* check = As<ZEPDlgCheckButton>(inside[i], dialog);
       const bool wasOn = check->GetState() == ZEPDlgChecked;
-      EXPECT_EQ(wasOn, windowClose != (i != 0))
-          << "shows the cached value: stored, then as last written";
+      EXPECT_EQ(wasOn, windowClose != (i != 0)) << "shows the cached value: stored, then as last written";
       ASSERT_TRUE(ZEPDlgDriver::Click(check));
       ASSERT_EQ(Hooks(), std::vector<std::string>{hooks[i]});
       EXPECT_EQ(_script.calls[0].values[0], wasOn ? 0.0 : 1.0);

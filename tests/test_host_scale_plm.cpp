@@ -15,26 +15,21 @@ TEST_F(HostScaleToolbox, ScaleTextsAreReadAsRatiosOrNumbersAndGarbageIsRefused) 
     const char* text;
     double value;
     int form;
-  } good[] = {
-      {"1:50", 0.02, 1}, {" 1 / 50 ", 0.02, 2}, {"2", 2.0, 0}, {"0.5", 0.5, 0}, {"3:2", 1.5, 1}};
+  } good[] = {{"1:50", 0.02, 1}, {" 1 / 50 ", 0.02, 2}, {"2", 2.0, 0}, {"0.5", 0.5, 0}, {"3:2", 1.5, 1}};
   for (const auto& g : good) {
     ZEPUnicodeString text;
     double value = 0.0;
     int form = -1;
-    ASSERT_EQ(ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(g.text, text, value, form),
-              S_OK)
-        << g.text;
+    ASSERT_EQ(ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(g.text, text, value, form), S_OK) << g.text;
     EXPECT_DOUBLE_EQ(value, g.value) << g.text;
     EXPECT_EQ(form, g.form) << g.text;
   }
-  for (const char* bad : {"", "abc", "1:", ":50", "1:0", "0", "-2", "1:-5", "1:2:3", "1:2/3", "inf",
-                          "nan", "0x10", "1e400", "2 3", "1,5"}) {
+  for (const char* bad : {"", "abc", "1:", ":50", "1:0", "0", "-2", "1:-5", "1:2:3", "1:2/3", "inf", "nan", "0x10",
+                          "1e400", "2 3", "1,5"}) {
     ZEPUnicodeString text("kept");
     double value = 7.0;
     int form = 9;
-    EXPECT_EQ(ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(bad, text, value, form),
-              E_FAIL)
-        << bad;
+    EXPECT_EQ(ZEPDfuScaleAndUnitsToolbox::ConvertScaleFromStringToDouble(bad, text, value, form), E_FAIL) << bad;
     EXPECT_EQ(value, 7.0) << bad;
     EXPECT_EQ(text.str(), "kept") << bad;
   }
@@ -47,8 +42,7 @@ TEST_F(HostScaleToolbox, DecimalsBecomeTheSimplestCloseFraction) {
                {0.75, 3, 4},   {1.0 / 3, 1, 3}, {-0.5, -1, 2},      {0, 0, 1}};
   for (const auto& c : cases) {
     double n = 1.0, d = 1.0;
-    ASSERT_EQ(ZEPDfuScaleAndUnitsToolbox::DecimalToFractionConvertor(c.value, n, d, 6), S_OK)
-        << c.value;
+    ASSERT_EQ(ZEPDfuScaleAndUnitsToolbox::DecimalToFractionConvertor(c.value, n, d, 6), S_OK) << c.value;
     EXPECT_EQ(n, c.numerator) << c.value;
     EXPECT_EQ(d, c.denominator) << c.value;
   }
@@ -70,8 +64,7 @@ TEST_F(HostToolkitExtras, ListNotificationsAreTypedAndReachTheCombosSubscribers)
   EXPECT_NE(ZEPSysDynamicCast<ZEPDlgComboDropNotification>(drop), nullptr);
   EXPECT_EQ(ZEPSysDynamicCast<ZEPDlgComboCloseUpNotification>(drop), nullptr);
   EXPECT_NE(ZEPSysDynamicCast<ZEPDlgComboCloseUpNotification>(closeUp), nullptr);
-  EXPECT_EQ(ZEPSysDynamicCast<ZEPDlgComboDropNotification>(combo->GetComboSelectNotification()),
-            nullptr);
+  EXPECT_EQ(ZEPSysDynamicCast<ZEPDlgComboDropNotification>(combo->GetComboSelectNotification()), nullptr);
 
   combo->SetLine("plain");
   combo->SetLine("with icon", ZEPString("I_Icon"));

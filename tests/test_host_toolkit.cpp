@@ -5,24 +5,6 @@
 #include <random>
 
 namespace {
-struct Recorder : ZEPDlgFrame {
-  explicit Recorder(ZEPDialog* iParent) : ZEPDlgFrame(iParent, "recorder") {}
-  void Listen(ZEPCommand* iSender, ZEPNotification* iNotif) {
-    AddAnalyseNotificationCB(iSender, iNotif, &Recorder::OnNotify, this);
-  }
-  std::vector<std::string> _events;
-
-private:
-  void OnNotify(ZEPCommand* iSender, ZEPNotification* iNotif, void* iData) {
-    EXPECT_EQ(iData, this);
-    auto* w = ZEPSysDynamicCast<ZEPDialog>(iSender);
-    auto* radio = ZEPSysDynamicCast<ZEPDlgRadioButton>(iSender);
-    // Record the state at the time of the notification.
-    _events.push_back((w ? w->GetOwnName() : std::string("?")) + ":" + iNotif->GetKind() +
-                      (radio ? (radio->GetState() == ZEPDlgChecked ? "=on" : "=off") : ""));
-  }
-};
-
 int Descending(int* a, int* b) { return *a < *b ? 1 : -1; }           // never 0
 int AlwaysGreater(int*, int*) { return 1; }                           // inconsistent
 int AlwaysLess(int*, int*) { return -1; }                             // inconsistent
@@ -39,7 +21,7 @@ TEST_F(HostToolkit, RadioGroupsTurnOneOffThenNotifyBoth) {
   auto* elsewhere = new ZEPDlgRadioButton(other, "radElsewhere");
   elsewhere->SetState(ZEPDlgChecked);
   fix->SetState(ZEPDlgChecked, 1); // programmatic: no notification
-  Recorder rec(&_root);
+  NotificationRecorder rec(&_root);
   for (auto* r : {fix, face, elsewhere}) rec.Listen(r, r->GetRadBModifyNotification());
 
   EXPECT_TRUE(ZEPDlgDriver::Click(face));
@@ -59,7 +41,7 @@ TEST_F(HostToolkit, RadioGroupsTurnOneOffThenNotifyBoth) {
 
 TEST_F(HostToolkit, NotificationsRiseToTheRegisteredSenderAndSkipTheDead) {
   auto* colour = new ZEPComboColor(&_root, "cmbColor", 0, 255, 255, 255, 0, 0, 0);
-  auto* rec = new Recorder(&_root);
+  auto* rec = new NotificationRecorder(&_root);
   // Registered on the application combo for its inner combo's notification.
   rec->Listen(colour, colour->GetCombo()->GetComboSelectNotification());
   EXPECT_TRUE(ZEPDlgDriver::SelectColor(colour, 1, 2, 3));
@@ -73,7 +55,7 @@ TEST_F(HostToolkit, NotificationsRiseToTheRegisteredSenderAndSkipTheDead) {
   // A destroyed subscriber is never called, even by a sender that outlives it.
   delete rec;
   EXPECT_TRUE(ZEPDlgDriver::Select(colour, 2));
-  auto* again = new Recorder(&_root);
+  auto* again = new NotificationRecorder(&_root);
   EXPECT_TRUE(ZEPDlgDriver::Select(colour, 3));
   EXPECT_TRUE(again->_events.empty());
 }

@@ -18,12 +18,13 @@ protected:
   void ScriptEveryPart() {
     _script.allInfoSet = true;
     _script.storeWrites = true;
-    _script.textLists = {{"StandardPLMList", {"Company A", "Company B"}},
-                         {"StandardPLMIDList", {"key-a", "key-b"}}};
+    _script.textLists = {{"StandardPLMList", {"Company A", "Company B"}}, {"StandardPLMIDList", {"key-a", "key-b"}}};
     _script.texts = {{"StandardName", "key-a"}};
-    _script.values = {{"IsStandardPLM", {1}},
-                      {"InsertDrawing", {1}},
-                      {"ScaleRatio", {0.5, 100, 10000, 0.01, 0.0001}}};
+    _script.values = {{"IsStandardPLM", {1}}, {"InsertDrawing", {1}}, {"ScaleRatio", {0.5, 100, 10000, 0.01, 0.0001}}};
+  }
+  void OpenEveryPart() {
+    ScriptEveryPart();
+    Open();
   }
   // A fresh page in a window of its own, built: the rows it used.
   int Build() {
@@ -51,16 +52,12 @@ protected:
     }
     return out;
   }
-  std::string Selected() {
-    ZEPUnicodeString text;
-    return StdCombo()->GetLine(text, StdCombo()->GetSelect()) < 0 ? "none" : text.str();
-  }
+  std::string Selected() { return ComboLine(*StdCombo(), StdCombo()->GetSelect()); }
   // The written value of iHook's last call: its text, or its first number.
   std::string Written(const char* iHook) {
     auto calls = _script.Calls(iHook);
     if (calls.empty()) return "(not written)";
-    return calls.back().values.empty() ? calls.back().text
-                                       : std::to_string(int(calls.back().values[0]));
+    return calls.back().values.empty() ? calls.back().text : std::to_string(int(calls.back().values[0]));
   }
 };
 } // namespace
@@ -87,8 +84,7 @@ TEST_F(MainPage, EachOptionalPartExistsExactlyWhenItsInfoHookDoesNotFail) {
       _script.info = {{part.attribute, status}};
       const int rows = Build();
       const bool present = status >= 0;
-      EXPECT_EQ(Find(part.widget) != nullptr, present)
-          << part.attribute << " " << status;
+      EXPECT_EQ(Find(part.widget) != nullptr, present) << part.attribute << " " << status;
       EXPECT_EQ(rows, present ? part.rows : 1) << part.attribute << " " << status;
     }
   // Rows follow each other in the order insert, shareable, scale ratio.
@@ -110,15 +106,14 @@ TEST_F(MainPage, PLMListsThatDoNotPairUpAreDropped) {
   ScriptEveryPart();
   _script.textLists["StandardPLMIDList"] = {"key-a"};
   Open();
-  EXPECT_EQ(Lines(), (Strings{"key-a <I_D3M_Database>", "ANSI <I_D3M_Folder>", "ISO <I_D3M_Folder>",
-                              "JIS <I_D3M_Folder>"}));
+  EXPECT_EQ(Lines(),
+            (Strings{"key-a <I_D3M_Database>", "ANSI <I_D3M_Folder>", "ISO <I_D3M_Folder>", "JIS <I_D3M_Folder>"}));
   EXPECT_FALSE(Enabled("pusStandardPLMRemove"));
 }
 
 // ---- choosing a standard -----------------------------------------------------------------------
 TEST_F(MainPage, ChoosingAFolderOrAPLMStandardWritesTheNameThenTheFlag) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   ASSERT_TRUE(ZEPDlgDriver::Select(StdCombo(), 1)); // ISO
   EXPECT_EQ(Hooks(), (Strings{"SetSysStandardName", "SetSysIsStandardPLM"}));
   EXPECT_EQ(Written("SetSysStandardName"), "ISO");
@@ -168,7 +163,7 @@ TEST_F(MainPage, TheListOffersOnlyChoicesWhileOpenAndTheStoredNameAgainWhenClose
   ASSERT_EQ(Lines().front(), "Gone");
   ASSERT_TRUE(ZEPDlgDriver::DropDown(StdCombo()));
   EXPECT_EQ(Lines(), (Strings{"ANSI", "ISO", "JIS"}));
-  EXPECT_EQ(Selected(), "none");
+  EXPECT_EQ(Selected(), ""); // none
   ASSERT_TRUE(ZEPDlgDriver::CloseUp(StdCombo()));
   EXPECT_EQ(Lines(), (Strings{"Gone", "ANSI", "ISO", "JIS"}));
   // A notification with nothing selected writes nothing.
@@ -179,8 +174,7 @@ TEST_F(MainPage, TheListOffersOnlyChoicesWhileOpenAndTheStoredNameAgainWhenClose
 
 // ---- adding and removing PLM standards --------------------------------------------------------
 TEST_F(MainPage, ValidatedChoiceAddsTheNewStandardsAndMakesTheFirstCurrent) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   const int live = ZEPRefCounted::LiveCount();
   ASSERT_TRUE(Click("pusStandardPLMAdd"));
   ZEPIPLMChooser* chooser = ZEPPLMSetup::LiveChooser();
@@ -190,10 +184,9 @@ TEST_F(MainPage, ValidatedChoiceAddsTheNewStandardsAndMakesTheFirstCurrent) {
   EXPECT_EQ(chooser->GetTypeNames(), Strings{"DIFStandardRep"}); // it offers standards only
   EXPECT_EQ(chooser->GetCommand()->GetFather(), _pPage);
 
-  ASSERT_TRUE(ZEPPLMSetup::Validate(
-      {{"Ünïcode std", "key-c"}, {"Company D", "key-d"}, {"Renamed A", "key-a"}}));
-  EXPECT_EQ(Hooks(), (Strings{"SetSysStandardPLMList", "SetSysStandardPLMIDList",
-                              "SetSysStandardName", "SetSysIsStandardPLM"}));
+  ASSERT_TRUE(ZEPPLMSetup::Validate({{"Ünïcode std", "key-c"}, {"Company D", "key-d"}, {"Renamed A", "key-a"}}));
+  EXPECT_EQ(Hooks(),
+            (Strings{"SetSysStandardPLMList", "SetSysStandardPLMIDList", "SetSysStandardName", "SetSysIsStandardPLM"}));
   EXPECT_EQ(Written("SetSysStandardPLMList"), "Company A\nCompany B\nÜnïcode std\nCompany D\n");
   EXPECT_EQ(Written("SetSysStandardPLMIDList"), "key-a\nkey-b\nkey-c\nkey-d\n");
   EXPECT_EQ(Written("SetSysStandardName"), "key-c");
@@ -205,8 +198,7 @@ TEST_F(MainPage, ValidatedChoiceAddsTheNewStandardsAndMakesTheFirstCurrent) {
 }
 
 TEST_F(MainPage, ObjectsWithoutInterfacesOrAReliableKeyAreSkippedAndReported) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   const int live = ZEPRefCounted::LiveCount();
   ZEPPLMSetup::Standard noComponent{"No component", "key-1"}, noAlias{"No alias", "key-2"},
       keyFails{"Key fails", "key-3"}, notUnique{"Not unique", "key-4", -1}, good{"Good", "key-5"};
@@ -227,8 +219,7 @@ TEST_F(MainPage, ObjectsWithoutInterfacesOrAReliableKeyAreSkippedAndReported) {
 }
 
 TEST_F(MainPage, CancelledOrPressedTwiceTheChooserStaysTheOneThePageHolds) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   const int live = ZEPRefCounted::LiveCount();
   ASSERT_TRUE(Click("pusStandardPLMAdd"));
   ASSERT_TRUE(ZEPPLMSetup::Cancel());
@@ -251,8 +242,7 @@ TEST_F(MainPage, CancelledOrPressedTwiceTheChooserStaysTheOneThePageHolds) {
 }
 
 TEST_F(MainPage, ChooserServicesThatFailAreReportedAndLeaveNothingBehind) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   const int live = ZEPRefCounted::LiveCount();
   const struct {
     void (*setup)();
@@ -317,17 +307,15 @@ TEST_F(MainPage, RemovingTheCurrentPLMStandard) {
 
 // ---- scale ratio -------------------------------------------------------------------------------
 TEST_F(MainPage, RatioEntriesAreStoredForTheShownRangeWithinItsTolerances) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   ZEPDlgEditor* ratio = Editor("edtScaleRatio");
   const struct {
     const char* typed;
     const char* shown;
     double stored; // 0: refused
-  } entries[] = {{"1:50", "1:50", 0.02}, {"1/4", "1:4", 0.25},        {"2", "2:1", 2.0},
-                 {"0.75", "3:4", 0.75},  {"abc", "3:4", 0},           {"1:0", "3:4", 0},
-                 {"1:100000", "3:4", 0}, {"1:1000", "1:1000", 0.001}, {"1000", "1000:1", 1000.0},
-                 {"1001", "1000:1", 0}};
+  } entries[] = {{"1:50", "1:50", 0.02},     {"1/4", "1:4", 0.25}, {"2", "2:1", 2.0},      {"0.75", "3:4", 0.75},
+                 {"abc", "3:4", 0},          {"1:0", "3:4", 0},    {"1:100000", "3:4", 0}, {"1:1000", "1:1000", 0.001},
+                 {"1000", "1000:1", 1000.0}, {"1001", "1000:1", 0}};
   for (const auto& e : entries) {
     _script.calls.clear();
     ASSERT_TRUE(ZEPDlgDriver::EnterText(ratio, e.typed));
@@ -337,8 +325,7 @@ TEST_F(MainPage, RatioEntriesAreStoredForTheShownRangeWithinItsTolerances) {
       continue;
     }
     ASSERT_EQ(Hooks(), Strings{"SetSysScaleRatio"}) << e.typed;
-    EXPECT_EQ(_script.calls[0].values, (std::vector<double>{e.stored, 100, 10000, 0.01, 0.0001}))
-        << e.typed;
+    EXPECT_EQ(_script.calls[0].values, (std::vector<double>{e.stored, 100, 10000, 0.01, 0.0001})) << e.typed;
   }
   // Another range shows its own ratio and bounds, and writes nothing.
   _script.calls.clear();
@@ -355,8 +342,7 @@ TEST_F(MainPage, RatioEntriesAreStoredForTheShownRangeWithinItsTolerances) {
 }
 
 TEST_F(MainPage, ANonPositiveToleranceRefusesEveryEntry) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   for (double tolerance : {0.0, -0.001}) {
     ZEPScaleToolboxSetup::Reset();
     ZEPScaleToolboxSetup::SetTolerance(ZEPCkeScaleNormal, 6, tolerance);
@@ -371,8 +357,7 @@ TEST_F(MainPage, ANonPositiveToleranceRefusesEveryEntry) {
 
 TEST_F(MainPage, WithoutScalesServiceTheFirstRangeStaysShown) {
   ZEPScalesSetup::SetAvailable(false);
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   ZEPCheckLog::Clear();
   EXPECT_EQ(Editor("edtScaleRatio")->GetText().str(), "1:2");
   ASSERT_TRUE(ZEPDlgDriver::EnterText(Editor("edtScaleRatio"), "1:5"));
@@ -382,14 +367,12 @@ TEST_F(MainPage, WithoutScalesServiceTheFirstRangeStaysShown) {
 
 // ---- flags and locks ---------------------------------------------------------------------------
 TEST_F(MainPage, ShareableFollowsInsertDrawingButItsLockWins) {
-  ScriptEveryPart();
-  Open();
+  OpenEveryPart();
   ASSERT_TRUE(Click("chkInsertDrawing"));
   EXPECT_FALSE(Enabled("chkMakeDrawingShareable"));
   ASSERT_TRUE(Click("chkInsertDrawing"));
   ASSERT_TRUE(Click("chkMakeDrawingShareable"));
-  EXPECT_EQ(Hooks(),
-            (Strings{"SetSysInsertDrawing", "SetSysInsertDrawing", "SetSysMakeDrawingShareable"}));
+  EXPECT_EQ(Hooks(), (Strings{"SetSysInsertDrawing", "SetSysInsertDrawing", "SetSysMakeDrawingShareable"}));
   EXPECT_EQ(Written("SetSysMakeDrawingShareable"), "1");
 }
 
@@ -403,18 +386,15 @@ TEST_F(MainPage, EachLockStopsItsOwnControlsOnly) {
                {"InsertDrawing", {"chkInsertDrawing"}},
                {"MakeDrawingShareable", {"chkMakeDrawingShareable"}},
                {"ScaleRatio", {"edtScaleRatio", "cmbRatioRange"}}};
-  const Strings all = {"cmbStandardName",  "pusStandardPLMAdd",       "pusStandardPLMRemove",
-                       "chkInsertDrawing", "chkMakeDrawingShareable", "edtScaleRatio",
-                       "cmbRatioRange"};
+  const Strings all = {"cmbStandardName",         "pusStandardPLMAdd", "pusStandardPLMRemove", "chkInsertDrawing",
+                       "chkMakeDrawingShareable", "edtScaleRatio",     "cmbRatioRange"};
   for (const auto& lock : locks) {
     ScriptEveryPart();
     _script.locked = {lock.attribute};
     Open();
     for (const std::string& name : all) {
-      const bool stopped =
-          std::find(lock.stopped.begin(), lock.stopped.end(), name) != lock.stopped.end();
-      EXPECT_EQ(Enabled(name.c_str()), !stopped)
-          << lock.attribute << " " << name;
+      const bool stopped = std::find(lock.stopped.begin(), lock.stopped.end(), name) != lock.stopped.end();
+      EXPECT_EQ(Enabled(name.c_str()), !stopped) << lock.attribute << " " << name;
     }
   }
 }

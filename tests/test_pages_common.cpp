@@ -23,70 +23,27 @@ struct PageCase {
 };
 void PrintTo(const PageCase& iCase, std::ostream* oStream) { *oStream << iCase.name; }
 
-#define ZEP_SETTING(Name, Kind) #Name,
-const std::vector<std::string> kGridAttributes = {
-#include "ZEP2DBaseOptGridFrm.def"
-};
-const std::vector<std::string> kGalAttributes = {
-#include "ZEP2DBaseOptGalFrm.def"
-};
-const std::vector<std::string> kPrimaryViewAttributes = {
-#include "ZEP2DBasePrimaryViewFrm.def"
-};
-const std::vector<std::string> kDimAttributes = {
-#include "ZEP2DBaseOptDimFrm.def"
-};
-const std::vector<std::string> kGeoAttributes = {
-    // with those of the embedded grid page
-#include "ZEP2DBaseOptGeoFrm.def"
-#include "ZEP2DBaseOptGridFrm.def"
-};
-const std::vector<std::string> kManipAttributes = {
-#include "ZEP2DBaseOptManipFrm.def"
-};
-const std::vector<std::string> kAdminAttributes = {
-#include "ZEP2DBaseOptAdminFrm.def"
-};
-const std::vector<std::string> kMainAttributes = {
-#include "ZEP2DBaseOptMainFrm.def"
-};
-const std::vector<std::string> kAnnotAttributes = {
-#include "ZEP2DBaseOptAnnotFrm.def"
-};
-const std::vector<std::string> kDisplayAttributes = {
-#include "ZEP2DBaseOptDisplayFrm.def"
-};
-#undef ZEP_SETTING
+
+template <class P> ZEPDlgFrame* Opened(HookScript& iScript, ZEPDialog* iParent) {
+  return OpenPage<P>(iScript, iParent);
+}
 
 std::vector<PageCase> Pages() {
-  return {{"Grid", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingGridPage>(s, p); },
-           kGridAttributes, 1},
-          {"General", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingGalPage>(s, p); },
-           kGalAttributes, 0},
-          {"PrimaryView",
-           [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingPrimaryViewPage>(s, p); },
-           kPrimaryViewAttributes, 0},
-          {"Geometry", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingGeoPage>(s, p); },
-           kGeoAttributes, 4},
-          {"Dimension", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingDimPage>(s, p); },
-           kDimAttributes, 1},
-          {"Manipulators",
-           [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingManipPage>(s, p); },
-           kManipAttributes, 0, 0},
-          {"Administration",
-           [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingAdminPage>(s, p); },
-           kAdminAttributes, 2, 0},
-          {"Main", [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingMainPage>(s, p); },
-           kMainAttributes, 0, 1},
+  return {{"Grid", &Opened<RecordingGridPage>, kGridAttributes, 1},
+          {"General", &Opened<RecordingGalPage>, kGalAttributes, 0},
+          {"PrimaryView", &Opened<RecordingPrimaryViewPage>, kPrimaryViewAttributes, 0},
+          {"Geometry", &Opened<RecordingGeoPage>, kGeoAttributes, 4},
+          {"Dimension", &Opened<RecordingDimPage>, kDimAttributes, 1},
+          {"Manipulators", &Opened<RecordingManipPage>, kManipAttributes, 0, 0},
+          {"Administration", &Opened<RecordingAdminPage>, kAdminAttributes, 2, 0},
+          {"Main", &Opened<RecordingMainPage>, kMainAttributes, 0, 1},
           {"Annotation",
            [](HookScript& s, ZEPDialog* p) {
              s.info.emplace("CalloutSizeOverrun", 1); // the larger of its two layouts
-             return OpenPage<RecordingAnnotPage>(s, p);
+             return Opened<RecordingAnnotPage>(s, p);
            },
            kAnnotAttributes, 3, 0, {"!_pFraDialog"}},
-          {"Display",
-           [](HookScript& s, ZEPDialog* p) { return OpenPage<RecordingDisplayPage>(s, p); },
-           kDisplayAttributes, 3}};
+          {"Display", &Opened<RecordingDisplayPage>, kDisplayAttributes, 3}};
 }
 
 void Collect(ZEPDialog* iWidget, std::vector<ZEPDialog*>& oAll) {

@@ -8,24 +8,9 @@
 class ZEP2DBaseRangeCmbTest : public ZEPHostTest {
 protected:
   static std::string Name(int iScale) {
-    return ZEPGlobalFunctions2::GetScalesServices()
-        ->GetScaleName(static_cast<ZEPCkeScale>(iScale))
-        .str();
+    return ZEPGlobalFunctions2::GetScalesServices()->GetScaleName(static_cast<ZEPCkeScale>(iScale)).str();
   }
-  static std::vector<std::string> Lines(const ZEPDlgCombo& iCombo) {
-    std::vector<std::string> lines;
-    ZEPUnicodeString text;
-    for (int i = 0; i < iCombo.GetLineCount(); ++i) {
-      iCombo.GetLine(text, i);
-      lines.push_back(text.str());
-    }
-    return lines;
-  }
-  static std::string Selected(const ZEPDlgCombo& iCombo) {
-    ZEPUnicodeString text;
-    iCombo.GetLine(text, iCombo.ZEPDlgCombo::GetSelect());
-    return text.str();
-  }
+  static std::string Selected(const ZEPDlgCombo& iCombo) { return ComboLine(iCombo, iCombo.ZEPDlgCombo::GetSelect()); }
   static constexpr const char* kSelectCheck =
       "0<=ZEPDlgCombo::SetSelect(spScaleServices->GetScaleName(GetMatchingRange(iIdx)), 0)";
 };
@@ -34,7 +19,7 @@ TEST_F(ZEP2DBaseRangeCmbTest, ListsActivatedRangesInAscendingOrder) {
   ZEPScalesSetup::SetActivatedScales({5, 1, 3});
   ZEPScalesSetup::SetCurrentScale(3);
   auto* combo = new ZEP2DBaseRangeCmb(&_root, "cmbGridRange");
-  EXPECT_EQ((std::vector<std::string>{Name(1), Name(3), Name(5)}), Lines(*combo));
+  EXPECT_EQ((std::vector<std::string>{Name(1), Name(3), Name(5)}), ComboLines(*combo));
   EXPECT_EQ(Name(3), Selected(*combo));
   EXPECT_EQ(3, combo->GetSelect());
   EXPECT_EQ(ZEPDlgShow, combo->GetVisibility());
@@ -87,16 +72,14 @@ TEST_F(ZEP2DBaseRangeCmbTest, CurrentScaleOutsideTheRangesSelectsRangeOne) {
 }
 
 TEST_F(ZEP2DBaseRangeCmbTest, MatchingRange) {
-  for (int i : {1, 2, 3, 4})
-    EXPECT_EQ(i, ZEP2DBaseRangeCmb::GetMatchingRange(i));
-  for (int i : {0, -3, 5, 9})
-    EXPECT_EQ(ZEPCkeScaleExtraSmall, ZEP2DBaseRangeCmb::GetMatchingRange(i)) << i;
+  for (int i : {1, 2, 3, 4}) EXPECT_EQ(i, ZEP2DBaseRangeCmb::GetMatchingRange(i));
+  for (int i : {0, -3, 5, 9}) EXPECT_EQ(ZEPCkeScaleExtraSmall, ZEP2DBaseRangeCmb::GetMatchingRange(i)) << i;
 }
 
 TEST_F(ZEP2DBaseRangeCmbTest, BadActivatedListsAndMissingServiceAreReported) {
   ZEPScalesSetup::SetActivatedScales({2, 2, 9});
   auto* bad = new ZEP2DBaseRangeCmb(&_root, "cmbBad");
-  EXPECT_EQ((std::vector<std::string>{Name(2)}), Lines(*bad));
+  EXPECT_EQ((std::vector<std::string>{Name(2)}), ComboLines(*bad));
   EXPECT_TRUE(ZEPCheckLog::Contains("GetLineCount()==_activatedScales.Size()"));
 
   ZEPCheckLog::Clear();

@@ -38,15 +38,12 @@ class ScopedEnv {
 public:
   ScopedEnv(const char* iName, const char* iValue) : _name(iName) {
     if (const char* old = std::getenv(iName)) _old = old;
-    if (iValue) setenv(iName, iValue, 1);
-    else unsetenv(iName);
+    Set(iValue);
   }
-  ~ScopedEnv() {
-    if (_old) setenv(_name, _old->c_str(), 1);
-    else unsetenv(_name);
-  }
+  ~ScopedEnv() { Set(_old ? _old->c_str() : nullptr); }
 
 private:
+  void Set(const char* iValue) { iValue ? setenv(_name, iValue, 1) : unsetenv(_name); }
   const char* _name;
   std::optional<std::string> _old;
 };
@@ -86,6 +83,23 @@ template <class T> std::vector<T> Read(ZEPSysSettingRepository* iRepo, const cha
   int n = iRepo ? iRepo->ReadAttr(iName, v.data(), iCount) : 0;
   v.resize(static_cast<std::size_t>(n));
   return v;
+}
+
+// A store that could not read iFile writes nothing to it: no save of the user's file; no lock,
+// with or without a value, and no default in the administrator's. iFile still holds iText.
+void ExpectNothingWritten(ZEPAppSettingsFile& ioStore, const fs::path& iFile, bool iAdmin, const std::string& iText) {
+  const int v = 9;
+  if (iAdmin) {
+    EXPECT_LT(ioStore.Lock("DraftingOptions", "Unit"), 0);
+    EXPECT_LT(ioStore.Lock("DraftingOptions", "Unit", std::vector<int>{v}), 0);
+    EXPECT_LT(ioStore.SetAdminDefault("DraftingOptions", "Other", std::vector<int>{v}), 0);
+  } else {
+    ZEPSysSettingRepository* repo = ioStore.OpenSettings("DraftingOptions");
+    repo->WriteAttr("Unit", &v, 1);
+    EXPECT_LT(repo->SaveRepository(), 0);
+    EXPECT_NE(std::string::npos, ioStore.LastError().find(iFile.string())) << ioStore.LastError();
+  }
+  EXPECT_EQ(iText, ReadBytes(iFile));
 }
 
 } // namespace
@@ -470,18 +484,7 @@ TEST_F(SettingsFileTest, TruncatedFileIsReportedWhereItEndsAndNeverOverwritten) 
       const ZEPAppFileError& e = store.LoadErrors().front();
       EXPECT_EQ(file.string(), e.path);
       EXPECT_EQ(Place(prefix, len), std::make_pair(e.line, e.column)) << e.Text();
-
-      const int v = 9;
-      if (admin) {
-        EXPECT_LT(store.Lock("DraftingOptions", "Unit"), 0);
-        EXPECT_LT(store.SetAdminDefault("DraftingOptions", "Other", std::vector<int>{v}), 0);
-      } else {
-        ZEPSysSettingRepository* repo = store.OpenSettings("DraftingOptions");
-        repo->WriteAttr("Unit", &v, 1);
-        EXPECT_LT(repo->SaveRepository(), 0);
-        EXPECT_NE(std::string::npos, store.LastError().find(file.string()));
-      }
-      EXPECT_EQ(prefix, ReadBytes(file));
+      ExpectNothingWritten(store, file, admin, prefix);
     }
   }
 }
@@ -537,16 +540,8 @@ TEST_F(SettingsFileTest, WrongTypesAreReportedAtTheValue) {
     EXPECT_EQ(Place(text, at), std::make_pair(e.line, e.column)) << e.Text();
     EXPECT_NE(std::string::npos, e.message.find(c.says)) << e.Text();
 
-    ZEPSysSettingRepository* repo = store.OpenSettings("DraftingOptions");
-    if (c.admin) {
-      EXPECT_LT(store.Lock("DraftingOptions", "Unit", std::vector<int>{1}), 0);
-    } else {
-      EXPECT_TRUE(repo->IsLocked("Kept")) << "the other file still applies";
-      const int v = 5;
-      repo->WriteAttr("Unit", &v, 1);
-      EXPECT_LT(repo->SaveRepository(), 0);
-    }
-    EXPECT_EQ(text, ReadBytes(file));
+    EXPECT_TRUE(c.admin || store.OpenSettings("DraftingOptions")->IsLocked("Kept")) << "the other file applies";
+    ExpectNothingWritten(store, file, c.admin, text);
   }
 }
 
@@ -565,11 +560,7 @@ TEST_F(SettingsFileTest, InvalidUtf8IsReportedAtTheByte) {
       const ZEPAppFileError& e = store.LoadErrors().front();
       EXPECT_EQ(std::make_pair(3, inText ? 25 : 9), std::make_pair(e.line, e.column)) << e.Text();
       EXPECT_NE(std::string::npos, e.message.find("UTF-8"));
-      ZEPSysSettingRepository* repo = store.OpenSettings("DraftingOptions");
-      const int v = 1;
-      repo->WriteAttr("Unit", &v, 1);
-      EXPECT_LT(repo->SaveRepository(), 0);
-      EXPECT_EQ(text, ReadBytes(_user));
+      ExpectNothingWritten(store, _user, false, text);
     }
 }
 

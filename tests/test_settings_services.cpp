@@ -21,8 +21,7 @@ protected:
   static ZEPUnicodeString AngleUnit() { return S::GetAngleUnit(); }
   static std::vector<std::string> Names(const ZEPListValZEPUnicodeString& iList) {
     std::vector<std::string> names;
-    for (const ZEPUnicodeString& n : iList.Items())
-      names.push_back(n.str());
+    for (const ZEPUnicodeString& n : iList.Items()) names.push_back(n.str());
     return names;
   }
   static void SetPaperUnit(int iUnit) {
@@ -46,8 +45,7 @@ TEST_F(ZEPDrwSettingsServicesTest, ValueTransferAnswersOnlyTheInnerControl) {
     using C = decltype(iControl);
     for (ZEPCommand* sender :
          {static_cast<ZEPCommand*>(nullptr), static_cast<ZEPCommand*>(iControl),
-          static_cast<ZEPCommand*>(iControl->GetLock()),
-          static_cast<ZEPCommand*>(other->GetDialog())}) {
+          static_cast<ZEPCommand*>(iControl->GetLock()), static_cast<ZEPCommand*>(other->GetDialog())}) {
       EXPECT_EQ(E_FAIL, iRead(iControl, sender, out)) << iControl->GetOwnName();
       EXPECT_TRUE(out == iSentinel) << iControl->GetOwnName();
     }
@@ -57,24 +55,18 @@ TEST_F(ZEPDrwSettingsServicesTest, ValueTransferAnswersOnlyTheInnerControl) {
   };
 
   auto* check = new ZEPDrwLockCheckButton(&_root, "checkGrid", _info);
-  auto readCheck = [](auto* c, ZEPCommand* s, unsigned char& o) {
-    return S::GetValueFromCheckButton(c, s, o);
-  };
+  auto readCheck = [](auto* c, ZEPCommand* s, unsigned char& o) { return S::GetValueFromCheckButton(c, s, o); };
   EXPECT_EQ(S_OK, S::UpdateCheckButton(check, 5));
   EXPECT_EQ(1, probe(check, static_cast<unsigned char>(77), readCheck));
   EXPECT_EQ(S_OK, S::UpdateCheckButton(check, 0));
   EXPECT_EQ(0, probe(check, static_cast<unsigned char>(77), readCheck));
 
   auto* combo = new ZEPDrwLockCombo(&_root, "cmbStyle", _info);
-  for (const char* line : {"a", "b", "c"})
-    combo->SetLine(line);
+  for (const char* line : {"a", "b", "c"}) combo->SetLine(line);
   EXPECT_EQ(S_OK, S::UpdateCombo(combo, 2u));
-  EXPECT_EQ(2, probe(combo, -7,
-                     [](auto* c, ZEPCommand* s, int& o) { return S::GetValueFromCombo(c, s, o); }));
+  EXPECT_EQ(2, probe(combo, -7, [](auto* c, ZEPCommand* s, int& o) { return S::GetValueFromCombo(c, s, o); }));
   EXPECT_EQ(S_OK, S::UpdateCombo(combo, ZEPUnicodeString("b")));
-  auto readText = [](auto* c, ZEPCommand* s, ZEPUnicodeString& o) {
-    return S::GetValueFromCombo(c, s, o);
-  };
+  auto readText = [](auto* c, ZEPCommand* s, ZEPUnicodeString& o) { return S::GetValueFromCombo(c, s, o); };
   EXPECT_EQ("b", probe(combo, ZEPUnicodeString("none"), readText).str());
 
   // The break line is 0 in the settings and entry 8 of the combo, both ways.
@@ -88,9 +80,7 @@ TEST_F(ZEPDrwSettingsServicesTest, ValueTransferAnswersOnlyTheInnerControl) {
 
   auto* spinner = new ZEPDrwLockSpinner(&_root, "spnLength", _info, 0x60000);
   EXPECT_EQ(S_OK, S::UpdateSpinner(spinner, 0.5));
-  auto readMm = [](auto* c, ZEPCommand* s, double& o) {
-    return S::GetValueFromSpinner(c, s, 1000.0, o);
-  };
+  auto readMm = [](auto* c, ZEPCommand* s, double& o) { return S::GetValueFromSpinner(c, s, 1000.0, o); };
   EXPECT_DOUBLE_EQ(500.0, probe(spinner, -1.0, readMm));
 
   auto* colour = new ZEPDrwLockComboColor(&_root, "cmbColor", _info);
@@ -99,9 +89,7 @@ TEST_F(ZEPDrwSettingsServicesTest, ValueTransferAnswersOnlyTheInnerControl) {
     int r, g, b;
     bool operator==(const Rgb& o) const { return r == o.r && g == o.g && b == o.b; }
   };
-  auto readRgb = [](auto* c, ZEPCommand* s, Rgb& o) {
-    return S::GetValueFromComboColor(c, s, o.r, o.g, o.b);
-  };
+  auto readRgb = [](auto* c, ZEPCommand* s, Rgb& o) { return S::GetValueFromComboColor(c, s, o.r, o.g, o.b); };
   EXPECT_TRUE((Rgb{255, 128, 0}) == probe(colour, Rgb{-1, -1, -1}, readRgb));
   // Out of range components are refused in ints and unsigned ints; the combo keeps its colour.
   EXPECT_EQ(E_FAIL, S::UpdateComboColor(colour, 256, 0, 0));
@@ -118,8 +106,8 @@ public:
   explicit CountPage(ZEPDialog* iParent) : ZEPDlgFrame(iParent, "page") {
     ZEPSettingInfo info;
     _pSpinner = new ZEPDrwLockSpinner(this, "spnCount", info, 0x40000);
-    AddAnalyseNotificationCB(_pSpinner->GetDialog(), _pSpinner->GetSpinnerModifyNotification(),
-                             &CountPage::Write, nullptr);
+    AddAnalyseNotificationCB(_pSpinner->GetDialog(), _pSpinner->GetSpinnerModifyNotification(), &CountPage::Write,
+                             nullptr);
   }
   void Write(ZEPCommand* iSender, ZEPNotification*, void*) {
     _status = ZEPDrwSettingsServices::GetValueFromSpinner(_pSpinner, iSender, _count);
@@ -248,8 +236,7 @@ TEST_F(ZEPDrwSettingsServicesTest, XmlFileNamesAreFilteredDedupedAndSorted) {
   EXPECT_EQ(S_OK, S::GetXmlFilesNames("drafting", 1, names));
   EXPECT_EQ((std::vector<std::string>{"ANSI.xml", "ISO.XML", "ISO.xml"}), Names(names));
 
-  ZEPStdSetup::SetStandardFiles("drafting",
-                                {"Норма.xml", ".xml", "xml", "€.x", "b.XmL", "a.xml.bak"});
+  ZEPStdSetup::SetStandardFiles("drafting", {"Норма.xml", ".xml", "xml", "€.x", "b.XmL", "a.xml.bak"});
   EXPECT_EQ(S_OK, S::GetXmlFilesNames("drafting", 0, names));
   EXPECT_EQ((std::vector<std::string>{"", "b", "Норма"}), Names(names));
 

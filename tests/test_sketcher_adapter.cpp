@@ -49,12 +49,10 @@ public:
     ZEPHostTest::SetUp();
     _pGeneral = ZEPSysSettingRepository::Open("SketcherGeneral");
     _pSpecific = ZEPSysSettingRepository::Open("SketcherSpecific");
-    for (const char* name :
-         {Adapt::MultiModification(), Adapt::GridModification(), Adapt::GeomUIModification(),
-          Adapt::SnapModification(), Adapt::Visu3DUIModification(), Adapt::CpltModification()})
+    for (const char* name : {Adapt::MultiModification(), Adapt::GridModification(), Adapt::GeomUIModification(),
+                             Adapt::SnapModification(), Adapt::Visu3DUIModification(), Adapt::CpltModification()})
       _adapter.AddCallback(name, [this](const char* iName, ZEPNotification* iNotif, void* iData) {
-        _events.push_back(
-            {iName, iData, iNotif, _pWatched ? Stored(_pWatched, _watched) : Values{}});
+        _events.push_back({iName, iData, iNotif, _pWatched ? Stored(_pWatched, _watched) : Values{}});
       });
   }
   void Connect() { _adapter.UseRepositories(_pGeneral, _pSpecific); }
@@ -159,8 +157,7 @@ TEST_F(SketcherAdapter, ScalarSettersNormaliseWriteAndNotifyOnce) {
     rep->SetLock(row.attr, false);
   }
   EXPECT_TRUE(ZEPCheckLog::Contains("1==_pSettRep->WriteAttr(mstrShowPosition, &val)"));
-  for (auto [given, written] :
-       std::initializer_list<std::pair<int, int>>{{3, 1}, {-1, 1}, {2, 2}, {0, 0}}) {
+  for (auto [given, written] : std::initializer_list<std::pair<int, int>>{{3, 1}, {-1, 1}, {2, 2}, {0, 0}}) {
     _adapter.SetDragMode(given, 0);
     EXPECT_EQ(Stored(_pGeneral, "Drw_settings_DragModeR14"), Values{double(written)}) << given;
   }
@@ -172,13 +169,11 @@ TEST_F(SketcherAdapter, ScalarSettersNormaliseWriteAndNotifyOnce) {
 // One per-range setting: defaults without and with an empty repository, then writes from
 // an empty attribute (the other ranges get their defaults), normalised, notified after the write.
 template <class T>
-void CheckRange(SketcherAdapter& t, const char* iAttr, Values iDefaults,
-                T (Adapt::*iGet)(ZEPCkeScale), void (Adapt::*iSet)(T, int, ZEPCkeScale), T iBad,
-                T iBadWritten, T iGood, T iGoodWritten) {
+void CheckRange(SketcherAdapter& t, const char* iAttr, Values iDefaults, T (Adapt::*iGet)(ZEPCkeScale),
+                void (Adapt::*iSet)(T, int, ZEPCkeScale), T iBad, T iBadWritten, T iGood, T iGoodWritten) {
   SCOPED_TRACE(iAttr);
   for (bool connected : {false, true}) {
-    t._adapter.UseRepositories(connected ? t._pGeneral : nullptr,
-                               connected ? t._pSpecific : nullptr);
+    t._adapter.UseRepositories(connected ? t._pGeneral : nullptr, connected ? t._pSpecific : nullptr);
     for (int range = 0; range <= 6; ++range) {
       // Without a repository, and outside 1 to 5, the answer is that of range 1.
       const bool own = connected && range >= 1 && range <= 5;
@@ -206,16 +201,16 @@ void CheckRange(SketcherAdapter& t, const char* iAttr, Values iDefaults,
 
 TEST_F(SketcherAdapter, RangeSettersWriteTheirRangeAndKeepTheOthers) {
   const Values spacing = {100.0, 10000.0, 1000000.0, 1.0, 0.01}, steps(5, 10.0), flags(5, 0.0);
-  CheckRange(*this, "Drw_settings_GridPrimarySpacing", spacing, &Adapt::GetGridPrimSpac,
-             &Adapt::SetGridPrimSpac, -5.0, 100.0, 2.5, 2.5);
-  CheckRange(*this, "Drw_settings_GridSecondaryStep", steps, &Adapt::GetGridSecStep,
-             &Adapt::SetGridSecStep, 0, 10, 4, 4);
-  CheckRange(*this, "Drw_settings_AllowDistortions", flags, &Adapt::GetAllowDistortions,
-             &Adapt::SetAllowDistortions, 0, 0, 5, 1);
-  CheckRange(*this, "Drw_settings_GridVPrimarySpacing", spacing, &Adapt::GetGridVPrimSpac,
-             &Adapt::SetGridVPrimSpac, 0.0, 100.0, 7.0, 7.0);
-  CheckRange(*this, "Drw_settings_GridVSecondaryStep", steps, &Adapt::GetGridVSecStep,
-             &Adapt::SetGridVSecStep, -3, 10, 2, 2);
+  CheckRange(*this, "Drw_settings_GridPrimarySpacing", spacing, &Adapt::GetGridPrimSpac, &Adapt::SetGridPrimSpac, -5.0,
+             100.0, 2.5, 2.5);
+  CheckRange(*this, "Drw_settings_GridSecondaryStep", steps, &Adapt::GetGridSecStep, &Adapt::SetGridSecStep, 0, 10, 4,
+             4);
+  CheckRange(*this, "Drw_settings_AllowDistortions", flags, &Adapt::GetAllowDistortions, &Adapt::SetAllowDistortions, 0,
+             0, 5, 1);
+  CheckRange(*this, "Drw_settings_GridVPrimarySpacing", spacing, &Adapt::GetGridVPrimSpac, &Adapt::SetGridVPrimSpac,
+             0.0, 100.0, 7.0, 7.0);
+  CheckRange(*this, "Drw_settings_GridVSecondaryStep", steps, &Adapt::GetGridVSecStep, &Adapt::SetGridVSecStep, -3, 10,
+             2, 2);
 
   _pSpecific->SetUserValue("Drw_settings_GridPrimarySpacing", Values{1, 2, 3, 4, 5});
   _adapter.SetGridPrimSpac(42.0, 0, Range(4));
@@ -223,8 +218,7 @@ TEST_F(SketcherAdapter, RangeSettersWriteTheirRangeAndKeepTheOthers) {
   _pSpecific->SetLock("Drw_settings_GridPrimarySpacing", true);
   _events.clear();
   _adapter.SetGridPrimSpac(8.0, 1, Range(1));
-  EXPECT_TRUE(
-      ZEPCheckLog::Contains("1==_pSpecificSettRep->WriteAttr(mstrGridHPrSpacing, &gridSpacingH)"));
+  EXPECT_TRUE(ZEPCheckLog::Contains("1==_pSpecificSettRep->WriteAttr(mstrGridHPrSpacing, &gridSpacingH)"));
   EXPECT_TRUE(_events.empty());
 }
 
@@ -239,8 +233,7 @@ TEST_F(SketcherAdapter, ConstraintCreationAndTypes) {
   _pGeneral->SetUserValue("Drw_settings_CpltDirHorVert", std::vector<int>{1});
   EXPECT_EQ(_adapter.GetCreateConstraint(), 1);
 
-  for (int type : {1, 2, 4, 10})
-    EXPECT_EQ(_adapter.GetValidateCstType(static_cast<ZEP2DCstType>(type)), 0) << type;
+  for (int type : {1, 2, 4, 10}) EXPECT_EQ(_adapter.GetValidateCstType(static_cast<ZEP2DCstType>(type)), 0) << type;
   for (int type : {0, 3, 5, 6, 7, 8, 9, 11, -1})
     EXPECT_EQ(_adapter.GetValidateCstType(static_cast<ZEP2DCstType>(type)), 1) << type;
 }
@@ -259,8 +252,7 @@ TEST_F(SketcherAdapter, Colours) {
   _adapter.GetColorDiagElts(ZEP2DCstNotChanged, &c[0], &c[1], &c[2]);
   EXPECT_EQ(c, (Rgb{1, 2, 3}));
   // An incomplete stored colour is reported and gives the default.
-  _pSpecific->SetUserValue("Drw_settings_DiagNotConsistentEltsColor",
-                           std::vector<unsigned int>{9, 9});
+  _pSpecific->SetUserValue("Drw_settings_DiagNotConsistentEltsColor", std::vector<unsigned int>{9, 9});
   _adapter.GetColorDiagElts(ZEP2DCstNotConsistent, &c[0], &c[1], &c[2]);
   EXPECT_EQ(c, (Rgb{255, 0, 0}));
 
