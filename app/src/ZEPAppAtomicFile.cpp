@@ -45,6 +45,7 @@ int ZEPAppPosixFileOps::Create(const std::string& iPath, int iMode, std::FILE*& 
     ::unlink(iPath.c_str());
     return err;
   }
+  std::setvbuf(oFile, nullptr, _IONBF, 0); // the content is written whole: one call, no copy
   return 0;
 }
 
