@@ -501,3 +501,49 @@ TEST_F(SettingsStore, SavesInOneRunWriteWhatAWholeSaveWrites) {
   ASSERT_EQ(S_OK, again.Load(_u));
   EXPECT_EQ(expected, again.OpenSettings("R")->UserValues());
 }
+
+// Changes of the administrator's file made together go in one write: all of them or none.
+TEST_F(SettingsStore, AdministeredTogetherOrNotAtAll) {
+  struct CountingOps : ZEPAppPosixFileOps {
+    int renames = 0;
+    bool fail = false;
+    int Rename(const std::string& iFrom, const std::string& iTo) override {
+      if (fail) return EIO;
+      ++renames;
+      return ZEPAppPosixFileOps::Rename(iFrom, iTo);
+    }
+  };
+  auto ops = std::make_shared<CountingOps>();
+  ZEPAppSettingsFile store(ops);
+  ASSERT_EQ(S_OK, store.Load(_u, _a));
+  ZEPSysSettingRepository* repo = store.OpenSettings("R");
+  const std::vector<ZEPAppAdminEdit> group = {{ZEPAppAdminAction::Lock, "R", "A", std::vector<int>{1}},
+                                              {ZEPAppAdminAction::Lock, "R", "B", std::nullopt},
+                                              {ZEPAppAdminAction::Default, "R", "C", std::vector<std::string>{"x"}}};
+  ops->fail = true; // the disk refuses: neither the file nor the repository changes
+  EXPECT_EQ(E_FAIL, store.Administer(group));
+  EXPECT_FALSE(fs::exists(_admin));
+  EXPECT_FALSE(repo->IsLocked("A") || repo->IsLocked("B") || repo->Effective("C"));
+  ops->fail = false;
+  ASSERT_EQ(S_OK, store.Administer(group)) << store.LastError();
+  EXPECT_EQ(1, ops->renames);
+  EXPECT_TRUE(repo->IsLocked("A") && repo->IsLocked("B"));
+  ASSERT_TRUE(repo->Effective("C"));
+  EXPECT_EQ(ZEPAppValue(std::vector<std::string>{"x"}), *repo->Effective("C"));
+
+  // One change that cannot be made stops those before it too.
+  const std::string written = ReadBytes(_admin);
+  EXPECT_EQ(E_FAIL, store.Administer({{ZEPAppAdminAction::Unlock, "R", "A", std::nullopt},
+                                      {ZEPAppAdminAction::RemoveDefault, "R", "B", std::nullopt}}));
+  EXPECT_TRUE(Has(store.LastError(), "B is locked: unlock it first"));
+  EXPECT_EQ(written, ReadBytes(_admin));
+  EXPECT_TRUE(repo->IsLocked("A"));
+  // Nothing to do for any of them writes nothing; something to do for one writes once.
+  const std::vector<ZEPAppAdminEdit> unlock = {{ZEPAppAdminAction::Unlock, "R", "C", std::nullopt},
+                                               {ZEPAppAdminAction::Unlock, "R", "A", std::nullopt}};
+  EXPECT_EQ(1, store.Administer({unlock.front()}));
+  EXPECT_EQ(S_OK, store.Administer(unlock));
+  EXPECT_EQ(2, ops->renames);
+  EXPECT_FALSE(repo->IsLocked("A"));
+  EXPECT_TRUE(repo->IsLocked("B"));
+}

@@ -603,12 +603,10 @@ int Reset(const Request& iRequest, std::ostream& out, std::ostream& err) {
   return kExitOk;
 }
 
-enum class AdminAction { Lock, Unlock, Default, RemoveDefault };
-
 // lock KEY [VALUE], unlock KEY, default KEY VALUE and default --remove KEY: the administrator's
 // file. A value is taken as set takes it, by operating the control on this run only (nothing is
 // written to the user's file), then recorded in the administrator's file.
-int Administer(const Request& iRequest, AdminAction iAction, std::ostream& out, std::ostream& err) {
+int Administer(const Request& iRequest, ZEPAppAdminAction iAction, std::ostream& out, std::ostream& err) {
   Session session(out, err);
   const ZEPAppPage* page = nullptr;
   std::vector<ZEPAppControl> controls;
@@ -656,35 +654,17 @@ int Administer(const Request& iRequest, AdminAction iAction, std::ostream& out, 
   }
   std::string attribute; // the stored attributes, for the messages
   for (const ZEPAppSetting* row : rows) attribute += (attribute.empty() ? "" : ", ") + row->stored;
-  long rc = 1; // 1: nothing to do for any of the rows
-  for (std::size_t i = 0; i < rows.size() && SUCCEEDED(rc); ++i) {
-    const std::string& repository = rows[i]->repository;
-    const std::string& stored = rows[i]->stored;
-    const std::optional<ZEPAppValue>& value = values[i];
-    long one = S_OK;
-    switch (iAction) {
-    case AdminAction::Lock:
-      one = value ? session.File().Lock(repository, stored, *value) : session.File().Lock(repository, stored);
-      break;
-    case AdminAction::Unlock:
-      one = session.File().Unlock(repository, stored);
-      break;
-    case AdminAction::Default:
-      one = value ? session.File().SetAdminDefault(repository, stored, *value) : E_FAIL;
-      break;
-    case AdminAction::RemoveDefault:
-      one = session.File().RemoveAdminDefault(repository, stored);
-      break;
-    }
-    rc = FAILED(one) ? one : (one == 1 && rc == 1 ? 1 : S_OK);
-  }
+  // In one write: should it fail, no part of the group has changed.
+  std::vector<ZEPAppAdminEdit> edits;
+  for (std::size_t i = 0; i < rows.size(); ++i) edits.push_back({iAction, rows[i]->repository, rows[i]->stored, values[i]});
+  const long rc = session.File().Administer(edits);
   if (FAILED(rc)) {
     err << "error: " << session.File().LastError() << "\n";
     return kExitFile;
   }
   if (rc == 1) {
     out << attribute
-        << (iAction != AdminAction::Unlock ? " had no default" : rows.size() > 1 ? " were not locked" : " was not locked")
+        << (iAction != ZEPAppAdminAction::Unlock ? " had no default" : rows.size() > 1 ? " were not locked" : " was not locked")
         << "; nothing changed\n";
     return kExitOk;
   }
@@ -696,7 +676,7 @@ int Administer(const Request& iRequest, AdminAction iAction, std::ostream& out, 
   static const char* const kDone[] = {"Locked ", "Unlocked ", "Default for everyone of ", "Removed the default of "};
   out << kDone[static_cast<int>(iAction)] << attribute << " (" << page->name << "." << name << ") in "
       << session.File().AdminPath() << "\n";
-  if (iAction == AdminAction::RemoveDefault)
+  if (iAction == ZEPAppAdminAction::RemoveDefault)
     out << "  the application's own default applies from the next command on\n";
   else if (shown)
     out << "  " << shown->Title() << " = " << shown->Shown() << "\n";
@@ -964,11 +944,11 @@ int Run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
     if (r.args.empty()) return Reset(r, out, err);
     return TakeKey(r, 0, 0, err) ? kExitUsage : Reset(r, out, err);
   }
-  if (*lock) return TakeKey(r, 0, 1, err) ? kExitUsage : Administer(r, AdminAction::Lock, out, err);
-  if (*unlock) return TakeKey(r, 0, 0, err) ? kExitUsage : Administer(r, AdminAction::Unlock, out, err);
+  if (*lock) return TakeKey(r, 0, 1, err) ? kExitUsage : Administer(r, ZEPAppAdminAction::Lock, out, err);
+  if (*unlock) return TakeKey(r, 0, 0, err) ? kExitUsage : Administer(r, ZEPAppAdminAction::Unlock, out, err);
   if (*defaults) {
     if (int rc = TakeKey(r, r.remove ? 0 : 1, r.remove ? 0 : 1, err)) return rc;
-    return Administer(r, r.remove ? AdminAction::RemoveDefault : AdminAction::Default, out, err);
+    return Administer(r, r.remove ? ZEPAppAdminAction::RemoveDefault : ZEPAppAdminAction::Default, out, err);
   }
   return Overview(r, out, err);
 }

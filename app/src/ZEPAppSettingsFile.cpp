@@ -612,33 +612,76 @@ struct ZEPAppSettingsFile::Impl : std::enable_shared_from_this<Impl> {
     return rc;
   }
 
-  // Changes one entry of the administrator's file, writes it, then shows it in the repository.
-  // iEdit answers S_OK to write, or a success code other than S_OK when nothing is to change.
-  template <class Edit>
-  long EditAdmin(ZEPAppRepoKind iKind, const std::string& iRepo, const std::string& iAttr, Edit iEdit) {
+  // What one edit does to its entry: S_OK when it changes it, 1 when there is nothing to do.
+  long Edit(const ZEPAppAdminEdit& iEdit, ZEPAppAttrEntry& ioEntry, const ZEPSysSettingRepository& iRepo,
+            const std::string& iWho) {
+    switch (iEdit.action) {
+    case ZEPAppAdminAction::Lock:
+      if (iEdit.value) ioEntry.value = *iEdit.value;
+      else if (const ZEPAppValue* now = iRepo.Effective(iEdit.attribute)) ioEntry.value = *now;
+      ioEntry.locked = true;
+      ioEntry.by = iWho;
+      return S_OK;
+    case ZEPAppAdminAction::Unlock: // whether it is locked is decided on the file as read under its lock
+      if (!ioEntry.locked) return 1;
+      ioEntry.locked = false;
+      ioEntry.by.clear();
+      return S_OK;
+    case ZEPAppAdminAction::Default:
+      ioEntry.value = *iEdit.value;
+      return S_OK;
+    case ZEPAppAdminAction::RemoveDefault:
+      if (ioEntry.locked)
+        return Fail(iEdit.attribute + " is locked: unlock it first (its value then stays as a default)");
+      if (!ioEntry.value) return 1;
+      ioEntry.value.reset();
+      return S_OK;
+    }
+    return Fail("unknown change of the administrator's file");
+  }
+
+  // Changes entries of the administrator's file, writes it once, then shows them in the
+  // repositories. Nothing is written unless every edit can be made.
+  long EditAdmin(const std::vector<ZEPAppAdminEdit>& iEdits) {
     lastError.clear();
-    if (iRepo.empty() || iAttr.empty()) return Fail("a repository and an attribute name are needed");
+    for (const ZEPAppAdminEdit& e : iEdits) {
+      if (e.repository.empty() || e.attribute.empty()) return Fail("a repository and an attribute name are needed");
+      if (e.action == ZEPAppAdminAction::Default && !e.value) return Fail(e.attribute + ": a default needs a value");
+      if (e.value && !IsFinite(*e.value)) return Fail(e.attribute + ": NaN and infinities cannot be stored");
+      if (std::string why = e.value ? Unstorable(*e.value) : std::string(); !why.empty())
+        return Fail(e.attribute + ": " + why);
+    }
     if (admin.path.empty())
       return Fail("no administrator's file: give --admin FILE or set " + std::string(kAdminFileEnv));
     if (admin.fault)
       return Fail(admin.path + " is not changed because it could not be read (" + admin.fault->Text() +
                   "); correct it first");
-    ZEPSysSettingRepository* repo = Bind(iKind, iRepo, false);
+    std::vector<ZEPSysSettingRepository*> repos;
+    for (const ZEPAppAdminEdit& e : iEdits) repos.push_back(Bind(e.kind, e.repository, false));
     ZEPAppFileLock lock;
     if (!LockAndReread(admin, true, lock)) return E_FAIL;
+    const std::string who = CurrentUserName();
     ZEPAppSettingsDoc next = admin.doc;
-    ZEPAppAttrEntry& entry = next.Of(iKind)[iRepo][iAttr];
-    if (long rc = iEdit(entry, *repo); rc != S_OK) return rc;
-    if (entry.value) {
-      auto rule = rules.find({iKind, iRepo, iAttr});
-      std::string why = rule == rules.end() ? std::string() : Verdict(rule->second, *entry.value);
-      if (!why.empty()) return Fail(std::string(SectionName(iKind)) + "/" + iRepo + "/" + iAttr + ": " + why);
+    std::vector<std::pair<std::size_t, ZEPAppAttrEntry>> applied;
+    for (std::size_t i = 0; i < iEdits.size(); ++i) {
+      const ZEPAppAdminEdit& e = iEdits[i];
+      ZEPAppRepoEntries& entries = next.Of(e.kind)[e.repository];
+      ZEPAppAttrEntry& entry = entries[e.attribute];
+      const long rc = Edit(e, entry, *repos[i], who);
+      if (FAILED(rc)) return rc;
+      if (rc == S_OK && entry.value) {
+        auto rule = rules.find({e.kind, e.repository, e.attribute});
+        std::string why = rule == rules.end() ? std::string() : Verdict(rule->second, *entry.value);
+        if (!why.empty())
+          return Fail(std::string(SectionName(e.kind)) + "/" + e.repository + "/" + e.attribute + ": " + why);
+      }
+      if (rc == S_OK) applied.emplace_back(i, entry);
+      if (EntryEmpty(entry)) entries.erase(e.attribute);
+      if (entries.empty()) next.Of(e.kind).erase(e.repository);
     }
-    const ZEPAppAttrEntry applied = entry;
-    if (EntryEmpty(entry)) next.Of(iKind)[iRepo].erase(iAttr);
-    if (next.Of(iKind)[iRepo].empty()) next.Of(iKind).erase(iRepo);
+    if (applied.empty()) return 1;
     if (long rc = Write(admin, std::move(next), true); FAILED(rc)) return rc;
-    ApplyAdmin(*repo, iAttr, applied);
+    for (const auto& [i, entry] : applied) ApplyAdmin(*repos[i], iEdits[i].attribute, entry);
     return S_OK;
   }
 
@@ -761,59 +804,29 @@ long ZEPAppSettingsFile::SaveAll() {
 }
 
 long ZEPAppSettingsFile::Lock(const std::string& iRepository, const std::string& iAttribute, ZEPAppRepoKind iKind) {
-  const std::string who = CurrentUserName();
-  return _pImpl->EditAdmin(iKind, iRepository, iAttribute, [&](ZEPAppAttrEntry& e, ZEPSysSettingRepository& r) {
-    if (const ZEPAppValue* now = r.Effective(iAttribute)) e.value = *now;
-    e.locked = true;
-    e.by = who;
-    return S_OK;
-  });
+  return Administer({{ZEPAppAdminAction::Lock, iRepository, iAttribute, std::nullopt, iKind}});
 }
 
 long ZEPAppSettingsFile::Lock(const std::string& iRepository, const std::string& iAttribute, const ZEPAppValue& iValue,
                               ZEPAppRepoKind iKind) {
-  if (!IsFinite(iValue)) return _pImpl->Fail(iAttribute + ": NaN and infinities cannot be stored");
-  if (std::string why = Unstorable(iValue); !why.empty()) return _pImpl->Fail(iAttribute + ": " + why);
-  const std::string who = CurrentUserName();
-  return _pImpl->EditAdmin(iKind, iRepository, iAttribute, [&](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) {
-    e.value = iValue;
-    e.locked = true;
-    e.by = who;
-    return S_OK;
-  });
+  return Administer({{ZEPAppAdminAction::Lock, iRepository, iAttribute, iValue, iKind}});
 }
 
 long ZEPAppSettingsFile::Unlock(const std::string& iRepository, const std::string& iAttribute, ZEPAppRepoKind iKind) {
-  Impl& d = *_pImpl;
-  // Whether it is locked is decided on the file as read under its lock.
-  return d.EditAdmin(iKind, iRepository, iAttribute, [](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) -> long {
-    if (!e.locked) return 1;
-    e.locked = false;
-    e.by.clear();
-    return S_OK;
-  });
+  return Administer({{ZEPAppAdminAction::Unlock, iRepository, iAttribute, std::nullopt, iKind}});
 }
 
 long ZEPAppSettingsFile::SetAdminDefault(const std::string& iRepository, const std::string& iAttribute,
                                          const ZEPAppValue& iValue, ZEPAppRepoKind iKind) {
-  if (!IsFinite(iValue)) return _pImpl->Fail(iAttribute + ": NaN and infinities cannot be stored");
-  if (std::string why = Unstorable(iValue); !why.empty()) return _pImpl->Fail(iAttribute + ": " + why);
-  return _pImpl->EditAdmin(iKind, iRepository, iAttribute, [&](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) {
-    e.value = iValue;
-    return S_OK;
-  });
+  return Administer({{ZEPAppAdminAction::Default, iRepository, iAttribute, iValue, iKind}});
 }
 
 long ZEPAppSettingsFile::RemoveAdminDefault(const std::string& iRepository, const std::string& iAttribute,
                                             ZEPAppRepoKind iKind) {
-  Impl& d = *_pImpl;
-  return d.EditAdmin(iKind, iRepository, iAttribute, [&](ZEPAppAttrEntry& e, ZEPSysSettingRepository&) -> long {
-    if (e.locked) return d.Fail(iAttribute + " is locked: unlock it first (its value then stays as a default)");
-    if (!e.value) return 1;
-    e.value.reset();
-    return S_OK;
-  });
+  return Administer({{ZEPAppAdminAction::RemoveDefault, iRepository, iAttribute, std::nullopt, iKind}});
 }
+
+long ZEPAppSettingsFile::Administer(const std::vector<ZEPAppAdminEdit>& iEdits) { return _pImpl->EditAdmin(iEdits); }
 
 const ZEPAppSettingsDoc& ZEPAppSettingsFile::AdminDoc() const { return _pImpl->admin.doc; }
 

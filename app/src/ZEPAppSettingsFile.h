@@ -8,6 +8,7 @@
 
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -45,6 +46,16 @@ struct ZEPAppAttrRule {
   // Why a value of the right kind and count is refused; empty when it is accepted. May be
   // left empty: no limits.
   std::function<std::string(const ZEPAppValue&)> check;
+};
+
+// A change of the administrator's file: what Lock, Unlock, SetAdminDefault and
+// RemoveAdminDefault do to one attribute.
+enum class ZEPAppAdminAction { Lock, Unlock, Default, RemoveDefault };
+struct ZEPAppAdminEdit {
+  ZEPAppAdminAction action;
+  std::string repository, attribute;
+  std::optional<ZEPAppValue> value; // Lock: kept (none: the value it reads now); Default: needed
+  ZEPAppRepoKind kind = ZEPAppRepoKind::Setting;
 };
 
 // The login name that a lock records as its author.
@@ -108,6 +119,9 @@ public:
   // (nothing written); E_FAIL for a locked one (its value is the lock's: unlock it first).
   long RemoveAdminDefault(const std::string& iRepository, const std::string& iAttribute,
                           ZEPAppRepoKind iKind = ZEPAppRepoKind::Setting);
+  // Several of those changes in one write of the administrator's file: all of them or none.
+  // S_OK when something changed, 1 when none had anything to do (nothing written).
+  long Administer(const std::vector<ZEPAppAdminEdit>& iEdits);
   // The administrator's file as last read or written.
   const ZEPAppSettingsDoc& AdminDoc() const;
 
