@@ -7,6 +7,7 @@
 
 #include <cstdlib>
 #include <fstream>
+#include <random>
 #include <sstream>
 #include <string>
 #include <vector>
@@ -89,3 +90,18 @@ protected:
   // A top-level window that owns what a test builds on it.
   ZEPDlgWindow _root{nullptr, "root", 0};
 };
+
+// iText with 1 to iMostEdits characters of iAlphabet put in place of one, inserted or removed,
+// at random places: what a broken disk or a careless hand leaves of a file.
+inline std::string Garbled(std::string iText, std::mt19937& ioRandom, const std::string& iAlphabet, int iMostEdits) {
+  for (int k = 0, edits = 1 + static_cast<int>(ioRandom() % static_cast<unsigned>(iMostEdits)); k < edits; ++k) {
+    const std::size_t pos = ioRandom() % iText.size();
+    const char c = iAlphabet[ioRandom() % iAlphabet.size()];
+    switch (ioRandom() % 3) {
+    case 0: iText[pos] = c; break;
+    case 1: iText.insert(pos, 1, c); break;
+    default: iText.erase(pos, 1);
+    }
+  }
+  return iText;
+}

@@ -571,16 +571,7 @@ TEST_F(SettingsFileTest, AnyInputIsReportedNeverACrash) {
   std::mt19937 random(20240607u);
   const char alphabet[] = "{}[]\",:0-.e1\\u tfn\x80\xC3\xFF";
   for (int round = 0; round < 400; ++round) {
-    std::string text = sample;
-    for (int k = 0, edits = 1 + static_cast<int>(random() % 3); k < edits; ++k) {
-      const std::size_t pos = random() % text.size();
-      const char c = alphabet[random() % (sizeof alphabet - 1)];
-      switch (random() % 3) {
-      case 0: text[pos] = c; break;
-      case 1: text.insert(pos, 1, c); break;
-      default: text.erase(pos, 1);
-      }
-    }
+    const std::string text = Garbled(sample, random, alphabet, 3);
     WriteBytes(_admin, text);
     ZEPSysSettingRepository::CloseAll();
     ZEPSysPreferenceRepository::CloseAll();

@@ -1,5 +1,6 @@
 // The text of the settings files: saved files keep the bytes they have always had, and the
 // quick reading of a sound file answers what the thorough, fault-placing reading answers.
+#include "TestSupport.h"
 #include "ZEPAppSettingsFormat.h"
 
 #include <gtest/gtest.h>
@@ -207,16 +208,7 @@ TEST(SettingsText, QuickReadingAnswersAsTheThoroughOne) {
   // Written files with a few characters changed, inserted or removed.
   const char alphabet[] = "{}[]\",:0-.eE1+\\/u tfn\x80\xC3\xFF";
   for (int round = 0; round < 3000; ++round) {
-    std::string text = samples[random() % samples.size()];
-    for (int k = 0, edits = 1 + static_cast<int>(random() % 2); k < edits; ++k) {
-      const std::size_t pos = random() % text.size();
-      const char c = alphabet[random() % (sizeof alphabet - 1)];
-      switch (random() % 3) {
-      case 0: text[pos] = c; break;
-      case 1: text.insert(pos, 1, c); break;
-      default: text.erase(pos, 1);
-      }
-    }
+    const std::string text = Garbled(samples[random() % samples.size()], random, alphabet, 2);
     ExpectSameReading(text, round % 2 == 0);
     if (HasFailure()) return;
   }
