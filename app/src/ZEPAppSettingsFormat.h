@@ -48,17 +48,20 @@ struct ZEPAppAttrEntry {
 // Attribute name -> entry.
 using ZEPAppRepoEntries = std::map<std::string, ZEPAppAttrEntry>;
 
-// The content of one settings file: repositories by name.
-struct ZEPAppSettingsDoc {
-  std::map<std::string, ZEPAppRepoEntries> settings;
-  std::map<std::string, ZEPAppRepoEntries> preferences;
-  std::map<std::string, ZEPAppRepoEntries>& Of(ZEPAppRepoKind iKind) {
+// What a settings file holds for each kind of repository: repositories by name.
+template <class Repo> struct ZEPAppSections {
+  std::map<std::string, Repo> settings;
+  std::map<std::string, Repo> preferences;
+  std::map<std::string, Repo>& Of(ZEPAppRepoKind iKind) {
     return iKind == ZEPAppRepoKind::Setting ? settings : preferences;
   }
-  const std::map<std::string, ZEPAppRepoEntries>& Of(ZEPAppRepoKind iKind) const {
+  const std::map<std::string, Repo>& Of(ZEPAppRepoKind iKind) const {
     return iKind == ZEPAppRepoKind::Setting ? settings : preferences;
   }
 };
+
+// The content of one settings file.
+using ZEPAppSettingsDoc = ZEPAppSections<ZEPAppRepoEntries>;
 
 // A fault of a settings file. line and column are 1-based (columns count characters); 0 when
 // the fault has no place in the text (an unreadable file).
@@ -92,16 +95,7 @@ std::vector<ZEPAppFileError> ParseSettingsTextThoroughly(const std::string& iTex
 // The values of a user's file (which holds no locks), repositories by name: what loading it
 // gives the repositories.
 using ZEPAppRepoValues = std::map<std::string, ZEPAppValue>;
-struct ZEPAppSettingsValues {
-  std::map<std::string, ZEPAppRepoValues> settings;
-  std::map<std::string, ZEPAppRepoValues> preferences;
-  std::map<std::string, ZEPAppRepoValues>& Of(ZEPAppRepoKind iKind) {
-    return iKind == ZEPAppRepoKind::Setting ? settings : preferences;
-  }
-  const std::map<std::string, ZEPAppRepoValues>& Of(ZEPAppRepoKind iKind) const {
-    return iKind == ZEPAppRepoKind::Setting ? settings : preferences;
-  }
-};
+using ZEPAppSettingsValues = ZEPAppSections<ZEPAppRepoValues>;
 
 // Reads the values of a user's file in one pass, without a document. True when iText is a
 // sound user's file (ParseSettingsText would report nothing and read the same values); false
